@@ -1,0 +1,35 @@
+# The one place for language level, warnings, sanitizers and the libraries of the host.
+set(CMAKE_CXX_STANDARD 17)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS ON)
+set(CMAKE_C_STANDARD 11)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
+
+add_compile_options(-Wall -Wextra -Wformat=2)
+if(ZELQO_SANITIZE)
+  add_compile_options(-fsanitize=address,undefined -fno-omit-frame-pointer)
+  add_link_options(-fsanitize=address,undefined)
+endif()
+
+find_package(PkgConfig REQUIRED)
+# pkg_import(NAME MODULE...): pkg-config modules as the imported target pkg::NAME. Their headers
+# are system headers, so that only our own code has to be free of warnings.
+function(pkg_import name)
+  if(NOT TARGET PkgConfig::${name})
+    pkg_check_modules(${name} REQUIRED IMPORTED_TARGET GLOBAL ${ARGN})
+    add_library(pkg::${name} ALIAS PkgConfig::${name})
+  endif()
+endfunction()
+
+pkg_import(efl elementary ecore-x edje evas ecore ecore-evas ecore-file eina)
+pkg_import(glib gio-unix-2.0 glib-2.0)
+pkg_import(json json-glib-1.0)
+pkg_import(icu icu-i18n icu-uc)
+pkg_import(sqlite sqlite3)
+pkg_import(soup libsoup-3.0)
+
+find_program(EDJE_CC edje_cc REQUIRED)
+find_program(RSVG_CONVERT rsvg-convert REQUIRED)
+find_program(MSGFMT msgfmt REQUIRED)
