@@ -32,7 +32,7 @@ class ZQVOut {
   ~ZQVOut() { _owner.reset(_handle); }
   ZQVOut(const ZQVOut&) = delete;
   ZQVOut& operator=(const ZQVOut&) = delete;
-  operator typename Owner::pointer*() { return &_handle; }
+  operator typename Owner::pointer *() { return &_handle; }
 
  private:
   Owner& _owner;

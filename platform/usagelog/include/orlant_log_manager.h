@@ -19,7 +19,8 @@ typedef struct orlant_log_manager_s* orlant_log_manager_h;
 typedef void (*orlant_log_manager_reply_cb)(int request_id, int error, void* user_data);
 
 int orlant_log_manager_create(orlant_log_manager_h* handle);
-/// Inserts one record; `data` holds texts only and is copied. A null handle is an invalid parameter.
+/// Inserts one record; `data` holds texts only and is copied. A null handle is an invalid
+/// parameter.
 int orlant_log_manager_insert(orlant_log_manager_h handle, const char* content_uri, bundle* data,
                               orlant_log_manager_reply_cb callback, void* user_data,
                               int* request_id);
