@@ -1,0 +1,69 @@
+#include "MediaRecord.h"
+
+#include <gio/gio.h>
+
+#include <cstring>
+#include <memory>
+
+#include "ThumbnailQueue.h"
+
+namespace media {
+namespace {
+
+constexpr const char* kAttributes = G_FILE_ATTRIBUTE_STANDARD_TYPE
+    "," G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE "," G_FILE_ATTRIBUTE_TIME_MODIFIED
+    "," G_FILE_ATTRIBUTE_THUMBNAIL_PATH;
+
+struct Release {
+  void operator()(void* object) const { g_object_unref(object); }
+};
+using OwnedFile = std::unique_ptr<GFile, Release>;
+using OwnedInfo = std::unique_ptr<GFileInfo, Release>;
+
+OwnedInfo query(const std::string& path, const char* attributes) {
+  const OwnedFile file(g_file_new_for_path(path.c_str()));
+  return OwnedInfo(
+      g_file_query_info(file.get(), attributes, G_FILE_QUERY_INFO_NONE, nullptr, nullptr));
+}
+
+guint64 modified(GFileInfo* info) {
+  return g_file_info_get_attribute_uint64(info, G_FILE_ATTRIBUTE_TIME_MODIFIED);
+}
+
+// GIO's own verdict is of no use here: the thumbnailer writes times with decimals, which GIO takes
+// for a mismatch.
+std::string currentThumbnail(GFileInfo* info) {
+  const char* path = g_file_info_get_attribute_byte_string(info, G_FILE_ATTRIBUTE_THUMBNAIL_PATH);
+  if (!path) return {};
+  const auto thumbnail = query(path, G_FILE_ATTRIBUTE_TIME_MODIFIED);
+  return thumbnail && modified(thumbnail.get()) >= modified(info) ? path : "";
+}
+
+std::string mimeTypeOf(GFileInfo* info) {
+  const char* type =
+      g_file_info_get_attribute_string(info, G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE);
+  const std::unique_ptr<char, void (*)(void*)> mimeType(
+      type ? g_content_type_get_mime_type(type) : nullptr, g_free);
+  return mimeType ? mimeType.get() : "application/octet-stream";
+}
+
+bool hasPicture(const std::string& mimeType) {
+  return mimeType.compare(0, 6, "image/") == 0 || mimeType.compare(0, 6, "video/") == 0;
+}
+
+}  // namespace
+
+std::optional<MediaRecord> lookUp(const std::string& path) {
+  const auto info = query(path, kAttributes);
+  if (!info || g_file_info_get_attribute_uint32(info.get(), G_FILE_ATTRIBUTE_STANDARD_TYPE) !=
+                   G_FILE_TYPE_REGULAR) {
+    return {};
+  }
+  MediaRecord record{path, mimeTypeOf(info.get()), currentThumbnail(info.get())};
+  if (record.thumbnail.empty() && hasPicture(record.mimeType)) {
+    queueThumbnail(record.path, record.mimeType);
+  }
+  return record;
+}
+
+}  // namespace media
