@@ -1,0 +1,15 @@
+#pragma once
+
+/// Every picture file passes here before the canvas gets it: a header of a few bytes can make the
+/// image loaders spend gigabytes or crash.
+class ZQVPictureGate {
+ public:
+  enum Use {
+    Thumbnail,  ///< a small cell: the whole file must be small, too
+    FullView    ///< large JPEG pictures are allowed, they are decoded at a reduced size
+  };
+
+  /// Only the header of the file is read. A refusal is logged with its reason; a file that does not
+  /// exist and a null path are refused silently.
+  static bool passes(const char* path, Use use);
+};
