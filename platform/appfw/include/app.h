@@ -1,0 +1,4 @@
+#pragma once
+
+#include <app_common.h>
+#include <app_control.h>

@@ -1,0 +1,4 @@
+#pragma once
+
+#include <tizen_error.h>
+#include <tizen_type.h>

@@ -1,0 +1,3 @@
+#pragma once
+
+#include <notification_status.h>

@@ -1,0 +1,30 @@
+/// The short messages in the status bar.
+#pragma once
+
+#include <tizen.h>
+
+#ifdef __cplusplus
+extern "C" {
+#endif
+
+typedef enum {
+  NOTIFICATION_ERROR_NONE = TIZEN_ERROR_NONE,
+  NOTIFICATION_ERROR_INVALID_PARAMETER = TIZEN_ERROR_INVALID_PARAMETER,
+  NOTIFICATION_ERROR_OUT_OF_MEMORY = TIZEN_ERROR_OUT_OF_MEMORY,
+  NOTIFICATION_ERROR_IO_ERROR = TIZEN_ERROR_IO_ERROR,
+  NOTIFICATION_ERROR_PERMISSION_DENIED = TIZEN_ERROR_PERMISSION_DENIED,
+  NOTIFICATION_ERROR_FROM_DB = TIZEN_ERROR_NOTIFICATION | 0x01,
+  NOTIFICATION_ERROR_ALREADY_EXIST_ID = TIZEN_ERROR_NOTIFICATION | 0x02,
+  NOTIFICATION_ERROR_FROM_DBUS = TIZEN_ERROR_NOTIFICATION | 0x03,
+  NOTIFICATION_ERROR_NOT_EXIST_ID = TIZEN_ERROR_NOTIFICATION | 0x04,
+  NOTIFICATION_ERROR_SERVICE_NOT_READY = TIZEN_ERROR_NOTIFICATION | 0x05,
+  NOTIFICATION_ERROR_INVALID_OPERATION = TIZEN_ERROR_INVALID_OPERATION
+} notification_error_e;
+
+/// Shows `message`, as it stands, in place of the one before. Null or empty is an invalid
+/// parameter. Returns without waiting for the status bar.
+int notification_status_message_post(const char* message);
+
+#ifdef __cplusplus
+}
+#endif
