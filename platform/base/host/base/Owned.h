@@ -1,0 +1,44 @@
+/// Owners of C handles. Two ways to release are two types, so what came from one allocator is never
+/// handed to another by accident.
+#pragma once
+
+#include <gio/gio.h>
+
+#include <memory>
+
+namespace base {
+
+template <auto Release>
+struct ReleaseWith {
+  template <typename T>
+  void operator()(T* handle) const {
+    Release(handle);
+  }
+};
+
+template <typename T, auto Release>
+using Owned = std::unique_ptr<T, ReleaseWith<Release>>;
+
+using OwnedText = Owned<char, g_free>;
+using OwnedTexts = Owned<char*, g_strfreev>;
+using OwnedError = Owned<GError, g_error_free>;
+using OwnedVariant = Owned<GVariant, g_variant_unref>;
+using OwnedBus = Owned<GDBusConnection, g_object_unref>;
+using OwnedMessage = Owned<GDBusMessage, g_object_unref>;
+
+/// For C functions that answer through an out-parameter: `get(handle, Out(text))`.
+template <typename Owner>
+class Out {
+ public:
+  explicit Out(Owner& owner) : _owner(owner) {}
+  ~Out() { _owner.reset(_handle); }
+  Out(const Out&) = delete;
+  Out& operator=(const Out&) = delete;
+  operator typename Owner::pointer *() { return &_handle; }
+
+ private:
+  Owner& _owner;
+  typename Owner::pointer _handle = nullptr;
+};
+
+}  // namespace base

@@ -1,0 +1,38 @@
+/// One open store file and its prepared statements. Every call answers an SQLite result code.
+#pragma once
+
+#include <base/KeyValueStore.h>
+#include <base/Owned.h>
+#include <sqlite3.h>
+
+#include <string>
+#include <vector>
+
+namespace base {
+
+class StoreConnection {
+ public:
+  int open(const std::string& path, bool create);
+  int check();
+
+  /// SQLITE_ROW when there is such a key, else SQLITE_DONE.
+  int get(const std::string& key, KeyValueStore::Value& value);
+  int set(const std::string& key, const KeyValueStore::Value& value);
+  /// SQLITE_ROW when there was such a key, else SQLITE_DONE.
+  int remove(const std::string& key);
+  int removeAll();
+  int keys(std::vector<std::string>& keys);
+
+ private:
+  using Statement = Owned<sqlite3_stmt, sqlite3_finalize>;
+
+  int execute(const char* sql);
+  int switchToWal();
+  int prepare(const char* sql, Statement& statement);
+  int prepareAll();
+
+  Owned<sqlite3, sqlite3_close> _db;
+  Statement _get, _set, _remove, _removeAll, _keys;
+};
+
+}  // namespace base
