@@ -1,0 +1,193 @@
+"""The inside of a phone: what runs on it, in which order it starts, and how it ends."""
+
+import os
+import signal
+import subprocess
+import sys
+import threading
+
+from lib import buses, environment, link, server
+from lib.program import Program
+from lib.report import Failure
+from lib.sharing import Sharing
+from lib.state import ROOT, VIEWER, State
+
+_EDS = ("org.gnome.evolution.dataserver.Sources5", "org.gnome.evolution.dataserver.AddressBook10")
+
+
+def together(*jobs):
+    """Runs the jobs at the same time; the first failure counts."""
+    failures = []
+
+    def run(job):
+        try:
+            job()
+        except Failure as failure:
+            failures.append(failure)
+
+    threads = [threading.Thread(target=run, args=(job,)) for job in jobs]
+    for thread in threads:
+        thread.start()
+    for thread in threads:
+        thread.join()
+    if failures:
+        raise failures[0]
+
+
+class Phone:
+    """Everything that runs on the phone. Its methods may be called from any thread."""
+
+    def __init__(self):
+        self.state = State(os.environ["PHONE_STATE"])
+        self.settings = self.state.settings()
+        self.run = os.environ["XDG_RUNTIME_DIR"]
+        self.environment = dict(os.environ)
+        for key in ("PHONE_DESKTOP_DISPLAY", "PHONE_DESKTOP_KEYS"):
+            self.environment.pop(key, None)
+        self.programs = []
+        self.display = None
+        self.language = self.settings["language"]
+        self.sharing = Sharing(self)
+        self.over = threading.Event()
+
+    # --- starting ---
+
+    def start(self):
+        together(self._start_screen, self._start_session, self._start_system)
+        together(self._start_notifications, self._warm_contacts, self._configure_applications)
+
+    def program(self, name, argv, env=None):
+        program = Program(name, argv, self.state.path("log", name + ".log"),
+                          env or self.environment)
+        open(self.state.path("log", name + ".log"), "wb").close()
+        self.programs.append(program)
+        return program
+
+    def tool(self, name):
+        """A program of the build, or None when it was not built."""
+        path = os.path.join(self.settings["build"], "bin", name)
+        return path if os.access(path, os.X_OK) else None
+
+    def vital(self, program):
+        """Without this program the phone is over."""
+
+        def watch():
+            program.wait()
+            if not self.over.is_set():
+                print(f"{program.name} ended; the phone goes down", flush=True)
+                self.over.set()
+                os.kill(os.getpid(), signal.SIGTERM)
+
+        threading.Thread(target=watch, daemon=True).start()
+
+    def _start_screen(self):
+        width, height = self.settings["screen"]
+        common = ["-displayfd", "{fd}", "-dpi", "160", "-noreset", "-nolisten", "tcp",
+                  "-extension", "GLX"]
+        desktop = os.environ.get("PHONE_DESKTOP_DISPLAY")
+        if desktop:
+            env = dict(self.environment, DISPLAY=desktop,
+                       XAUTHORITY=os.environ["PHONE_DESKTOP_KEYS"])
+            screen = self.program("screen", ["Xephyr", "-screen", f"{width}x{height}",
+                                             "-title", "phone", "-no-host-grab"] + common, env)
+        else:
+            screen = self.program("screen", ["Xvfb", "-screen", "0", f"{width}x{height}x24",
+                                             "-s", "0"] + common)
+        self.display = ":" + screen.start_and_read(through="fd")
+        self.environment["DISPLAY"] = self.display
+        self.vital(screen)
+        self._start_window_manager()
+
+    def _start_window_manager(self):
+        ours, theirs = os.pipe2(os.O_CLOEXEC)
+        os.close(ours)
+        os.close(theirs)
+        manager = self.program("window-manager", [
+            "openbox", "--sm-disable", "--config-file", os.path.join(ROOT, "phone/etc/openbox.xml"),
+            "--startup", "echo ready"])
+        manager.start_and_read()
+
+    def _start_session(self):
+        self.vital(buses.start(self, "session"))
+        self._wake_contacts()
+
+    def _start_system(self):
+        self.vital(buses.start(self, "system"))
+        world = self.tool("phone-world")
+        if world:
+            self.program("world", [world]).start_and_read()
+        recorder = self.tool("phone-signal")
+        if recorder:
+            self.program("signals", [recorder, "--record", os.path.join(self.run, "signals")]) \
+                .start_and_read()
+
+    def _wake_contacts(self):
+        """Their first start takes longest of all, so it goes on beside everything else."""
+        self._contacts = [subprocess.Popen(
+            ["gdbus", "call", "--session", "--dest", name, "--object-path", "/", "--method",
+             "org.freedesktop.DBus.Peer.Ping"], env=self.environment,
+            stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+            for name in _EDS]
+
+    def _warm_contacts(self):
+        for call in self._contacts:
+            call.wait()
+
+    def _start_notifications(self):
+        buses.environment(self, {"DISPLAY": self.display})
+        self.program("notifications", ["dunst", "-conf", os.path.join(self.run, "dunstrc")]).start()
+        buses.wait(self, "org.freedesktop.Notifications")
+
+    def _configure_applications(self):
+        self.sharing.start()
+
+    # --- what callers may ask for ---
+
+    def set_language(self, language):
+        """For everything that starts from now on."""
+        self.language = language
+        buses.environment(self, environment.language_of(language))
+        self.environment.update(environment.language_of(language))
+
+    def status(self):
+        from lib.image import applications
+        return {"display": self.display, "language": self.language, "service": self.sharing.url,
+                "programs": [{"name": program.name, "state": program.state()}
+                             for program in self.programs],
+                "applications": applications(self.state) + self._running_applications()}
+
+    @staticmethod
+    def _running_applications():
+        return []
+
+    # --- ending ---
+
+    def end(self):
+        self.over.set()
+        for program in reversed(self.programs):
+            program.ask_to_end()
+        for program in reversed(self.programs):
+            program.end()
+
+
+def supervise(told):
+    phone = Phone()
+
+    def stop(*_):
+        raise SystemExit(0)
+
+    for number in (signal.SIGTERM, signal.SIGINT, signal.SIGHUP):
+        signal.signal(number, stop)
+    try:
+        listener = link.listen(phone.run)
+        phone.start()
+        os.write(told, b"ready\n")
+        os.close(told)
+        server.serve(phone, listener)
+    except Failure as failure:
+        os.write(told, f"failed: {failure}\n".encode())
+        return 1
+    finally:
+        phone.end()
+        sys.stdout.flush()
+    return 0
