@@ -13,6 +13,11 @@ if(ZELQO_SANITIZE)
   add_link_options(-fsanitize=address,undefined)
 endif()
 
+if(ZELQO_FUZZ)
+  add_compile_options(-fsanitize=fuzzer-no-link,address,undefined -fno-sanitize-recover=undefined)
+  add_link_options(-fsanitize=address,undefined)
+endif()
+
 find_package(PkgConfig REQUIRED)
 # pkg_import(NAME MODULE...): pkg-config modules as the imported target pkg::NAME. Their headers
 # are system headers, so that only our own code has to be free of warnings.
