@@ -14,6 +14,8 @@ int app_control_import_from_bundle(app_control_h app_control, bundle* data);
 int app_control_export_as_bundle(app_control_h app_control, bundle** data);
 /// A request with a copy of the bundle.
 int app_control_create_request(bundle* data, app_control_h* app_control);
+/// A received request with a copy of the bundle, its caller included.
+int app_control_create_event(bundle* data, app_control_h* app_control);
 
 #ifdef __cplusplus
 }
