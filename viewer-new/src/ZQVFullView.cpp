@@ -1,0 +1,483 @@
+#include "ZQVFullView.h"
+
+#include <Ecore_File.h>
+#include <app_control.h>
+#include <system_settings.h>
+
+#include "ZQVAccess.h"
+#include "ZQVCommon.h"
+#include "ZQVDownloadMgr.h"
+#include "ZQVDownloadRule.h"
+#include "ZQVDownloadedFile.h"
+#include "ZQVFrames.h"
+#include "ZQVLog.h"
+#include "ZQVOrlantLog.h"
+#include "ZQVOwned.h"
+#include "ZQVStatusMessage.h"
+#include "ZQVText.h"
+#include "ZQVUnableOpenFilePopup.h"
+#include "ZQVWifiSelectPopup.h"
+#include "ZQVWindow.h"
+
+namespace {
+
+constexpr const char* kOpen = "IDS_RSH_BUTTON_OPEN";
+constexpr const char* kDownload = "IDS_RSH_BUTTON_DOWNLOAD_ABB3";
+constexpr const char* kServiceFolder = "/opt/usr/apps/com.orlant.zelqo/shared/data/";
+constexpr const char* kBoundButton = "bindedObject";
+constexpr const char* kBoundData = "bindedObjectClickedCbData";
+/// Long enough for the layout to settle after the pager got a new size.
+constexpr double kSettleTime = 0.1;
+/// Upstream's way to say "as many as you like".
+constexpr int kNoPageLimit = 9999;
+
+void setButton(Evas_Object* button, const char* text, bool isEnabled) {
+  elm_object_domain_translatable_text_set(button, ZQV_TEXT_DOMAIN, text);
+  elm_object_disabled_set(button, !isEnabled);
+}
+
+bool isSameAddress(const char* a, const char* b) {
+  return a && b && g_strcmp0(a, b) == 0;
+}
+
+void openReplyCb(app_control_h, app_control_h, app_control_result_e, void*) {}
+
+/// Gives a file to whichever application shows its kind; false when none takes it.
+bool launchViewer(app_control_h request, const char* path) {
+  app_control_set_uri(request, path);
+  app_control_set_operation(request, APP_CONTROL_OPERATION_VIEW);
+  app_control_set_launch_mode(request, APP_CONTROL_LAUNCH_MODE_GROUP);
+  return zqvMayBeOpened(path) &&
+         app_control_send_launch_request(request, openReplyCb, nullptr) == APP_CONTROL_ERROR_NONE;
+}
+
+}  // namespace
+
+ZQVFullView::ZQVFullView(Eina_List* items, int32_t viewKind, const char* sender, const char* token)
+    : _items(items),
+      _sender(sender ? sender : ""),
+      _token(token ? token : ""),
+      _grid(items, static_cast<ZQVViewType>(viewKind)) {}
+
+ZQVFullView::~ZQVFullView() {
+  _signals.stop();
+  _clearMark();
+  if (_unablePopup) _unablePopup->forgetOwner();
+  if (_wifiPopup) _wifiPopup->forgetOwner();
+  if (!_grid.get()) return;
+  evas_object_smart_callback_del_full(_grid.get(), "realized", _realizedCb, this);
+  evas_object_smart_callback_del_full(_grid.get(), "scroll", _scrollCb, this);
+  evas_object_event_callback_del_full(_grid.get(), EVAS_CALLBACK_RESIZE, _resizedCb, this);
+  evas_object_data_del(_grid.get(), kBoundData);
+  evas_object_data_del(_grid.get(), kBoundButton);
+}
+
+const char* ZQVFullView::getClassName() {
+  return "ZQVFullView";
+}
+
+Evas_Object* ZQVFullView::onCreateView(Evas_Object* parent, void* viewParam) {
+  if (!parent) {
+    ZQV_ERROR("parent is NULL");
+    return nullptr;
+  }
+  if (!viewParam) {
+    ZQV_ERROR("viewParam is NULL");
+    return nullptr;
+  }
+  _passedItem = static_cast<ZQViewerThumbnailItem*>(viewParam);
+  if (zqvIsDownloaded(*_passedItem)) _passedItem->downloadStatus = ZQV_DOWNLOADED;
+  _grid.create(parent);
+  _setUpPager();
+  _signals.start([this](const char* member, const char* url) { _downloadSignalCb(member, url); });
+  return _grid.get();
+}
+
+void ZQVFullView::onCreated() {
+  int32_t position = 0;
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_FOREACH(_items, node, data) {
+    auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    if (!item || !_grid.append(item, nullptr, nullptr)) continue;
+    // Files may have been dropped from the share; here page and file always agree.
+    item->index = position++;
+  }
+  _curItem = _passedItem;
+  _currentPage = _passedItem->index;
+  _showCurrentPage();
+}
+
+Elm_Object_Item* ZQVFullView::onPushToNaviframe(Evas_Object* naviframe) {
+  Evas_Object* back = elm_button_add(naviframe);
+  elm_object_style_set(back, "naviframe/end_btn/default");
+  evas_object_smart_callback_add(back, "clicked", _backButtonCb, this);
+  zqvSetAccessibleName(back, zqvText("Back"));
+  return elm_naviframe_item_push(naviframe, getTitle(), back, nullptr, getEvasObj(),
+                                 *getItemStyle() ? getItemStyle() : nullptr);
+}
+
+void ZQVFullView::onPushed(Elm_Object_Item* item) {
+  if (!item) {
+    ZQV_ERROR("naviItem is NULL");
+    return;
+  }
+  _toolButton = elm_button_add(getNaviframe()->getEvasObj());
+  elm_object_style_set(_toolButton, "bottom");
+  evas_object_smart_callback_add(_toolButton, "clicked", fullViewerToolBtnCb, this);
+  elm_object_item_part_content_set(item, "toolbar", _toolButton);
+  evas_object_data_set(_grid.get(), kBoundData, this);
+  evas_object_data_set(_grid.get(), kBoundButton, _toolButton.get());
+  _rotation.connect(zqvWindowOf(*this), "rotation,changed", _rotateCb, this);
+  if (_isSentShare()) {
+    elm_object_domain_translatable_text_set(_toolButton, ZQV_TEXT_DOMAIN, kOpen);
+  } else {
+    _createTitleIcon(item);
+  }
+  _updateDownloadedStatus();
+}
+
+bool ZQVFullView::onPop() {
+  _grid.forgetCells();
+  return true;
+}
+
+void ZQVFullView::setName(const char* name) {
+  _sender = name ? name : "";
+}
+
+void ZQVFullView::update(int event) {
+  if (event != SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE) return;
+  Evas_Object* button = elm_object_item_part_content_get(getNaviItem(), "toolbar");
+  if (!button) {
+    ZQV_ERROR("toolbar part object is null!");
+    return;
+  }
+  if (!_passedItem) {
+    ZQV_ERROR("_passedItem is null!");
+    return;
+  }
+  // It is the file that the page was opened with that counts here, not the one on screen. A sent
+  // file is only ever opened.
+  const bool isOpen = _isSentShare() || _passedItem->downloadStatus == ZQV_DOWNLOADED;
+  elm_object_domain_translatable_text_set(button, ZQV_TEXT_DOMAIN, isOpen ? kOpen : kDownload);
+  if (_unablePopup) _unablePopup->update(event);
+  if (_wifiPopup) _wifiPopup->update(event);
+}
+
+void ZQVFullView::_realizedCb(void* data, Evas_Object* pager, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  int width = 0;
+  int cellWidth = 0;
+  evas_object_geometry_get(pager, nullptr, nullptr, &width, nullptr);
+  elm_gengrid_item_size_get(pager, &cellWidth, nullptr);
+  if (width != cellWidth) static_cast<ZQVFullView*>(data)->_fitPages();
+}
+
+void ZQVFullView::_scrollCb(void* data, Evas_Object* pager, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  auto* view = static_cast<ZQVFullView*>(data);
+  // While the pages are being fitted the pager drifts; the page on screen stays the current one.
+  if (view->_delayer.isRunning()) return;
+  int page = 0;
+  elm_scroller_current_page_get(pager, &page, nullptr);
+  if (page == view->_currentPage) return;
+  view->_currentPage = page;
+  view->_curItem = view->_itemOfPage(page);
+  view->_updateDownloadedStatus();
+}
+
+void ZQVFullView::_rotateCb(void* data, Evas_Object*, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  static_cast<ZQVFullView*>(data)->_fitPages();
+}
+
+void ZQVFullView::_backButtonCb(void* data, Evas_Object*, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  static_cast<ZQVFullView*>(data)->getNaviframe()->pop();
+}
+
+void ZQVFullView::fullViewerToolBtnCb(void* data, Evas_Object* button, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  auto* view = static_cast<ZQVFullView*>(data);
+  if (!view->_curItem) {
+    ZQV_ERROR("_curItem is NULL");
+    return;
+  }
+  const char* text = elm_object_text_get(button);
+  if (view->_curItem->noThumbnail || !text || !*text) return;
+  if (g_strcmp0(text, zqvText(kOpen)) == 0) {
+    view->_openCurrent();
+  } else {
+    view->_downloadCurrent();
+  }
+}
+
+bool ZQVFullView::_delayerSetSize(void* data) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return false;
+  }
+  auto* view = static_cast<ZQVFullView*>(data);
+  Evas_Object* pager = view->_grid.get();
+  if (!pager) return false;
+  elm_scroller_page_show(pager, view->_currentPage, 0);
+  Eina_Bool isVerticalSnap = EINA_FALSE;
+  elm_scroller_page_snap_get(pager, nullptr, &isVerticalSnap);
+  elm_scroller_page_snap_set(pager, EINA_TRUE, isVerticalSnap);
+  return false;
+}
+
+void ZQVFullView::_downloadRequest(ZQVFullView* view, ZQVWifiSelectPopup* popup) {
+  if (!view) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  view->_isWifiOnly = popup->isWifiOnly();
+  if (!zqvNetworkAllowsDownload(view->_isWifiOnly)) return;
+  view->_handOver();
+  popup->close();
+}
+
+void ZQVFullView::_setUpPager() {
+  Evas_Object* pager = _grid.get();
+  evas_object_size_hint_weight_set(pager, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
+  elm_gengrid_align_set(pager, 0.0, 0.0);
+  elm_gengrid_horizontal_set(pager, EINA_TRUE);
+  elm_gengrid_multi_select_set(pager, EINA_TRUE);
+  elm_scroller_policy_set(pager, ELM_SCROLLER_POLICY_OFF, ELM_SCROLLER_POLICY_OFF);
+  elm_gengrid_select_mode_set(pager, ELM_OBJECT_SELECT_MODE_NONE);
+  evas_object_smart_callback_add(pager, "realized", _realizedCb, this);
+  elm_scroller_page_relative_set(pager, 1.0, 0.0);
+  elm_interface_scrollable_page_scroll_limit_set(pager, 1, kNoPageLimit);
+  elm_object_scroll_lock_y_set(pager, EINA_TRUE);
+  elm_scroller_single_direction_set(pager, ELM_SCROLLER_SINGLE_DIRECTION_HARD);
+  evas_object_smart_callback_add(pager, "scroll", _scrollCb, this);
+  evas_object_event_callback_add(pager, EVAS_CALLBACK_RESIZE, _resizedCb, this);
+  edje_object_color_class_set(elm_layout_edje_get(pager), "transparent", 229, 237, 240, 255, 0, 0,
+                              0, 0, 0, 0, 0, 0);
+  evas_object_show(pager);
+}
+
+void ZQVFullView::_resizedCb(void* data, Evas*, Evas_Object*, void*) {
+  static_cast<ZQVFullView*>(data)->_fitPages();
+}
+
+/// Makes every page as large as the pager, keeps the page on screen, and lets paging snap again
+/// once the layout has settled.
+void ZQVFullView::_fitPages() {
+  Evas_Object* pager = _grid.get();
+  int width = 0;
+  int height = 0;
+  evas_object_geometry_get(pager, nullptr, nullptr, &width, &height);
+  if (width <= 0 || height <= 0) return;
+  elm_gengrid_item_size_set(pager, width, height);
+  elm_scroller_page_size_set(pager, width, height);
+  _showCurrentPage();
+  _delayer.start(kSettleTime, [this] { return _delayerSetSize(this); });
+}
+
+void ZQVFullView::_showCurrentPage() {
+  Elm_Object_Item* cell = _curItem ? _curItem->gridItems[_grid.getViewType()] : nullptr;
+  if (!cell) return;
+  // With snapping on, the pager would move by one page only.
+  elm_scroller_page_snap_set(_grid.get(), EINA_FALSE, EINA_FALSE);
+  elm_gengrid_item_show(cell, ELM_GENGRID_ITEM_SCROLLTO_NONE);
+}
+
+void ZQVFullView::_createTitleIcon(Elm_Object_Item* item) {
+  _titleLayout = ZQViewerCommon::getInstance().createLayout(getNaviframe()->getEvasObj(),
+                                                            "layout/naviframe/title_right");
+  elm_object_item_part_content_set(item, "title_right_btn", _titleLayout);
+  if (_passedItem->downloadStatus == ZQV_DOWNLOADING) {
+    ZQV_TRACE("downloading icon:%s", zqvDownloadingLargeFrames[0]);
+  } else if (_passedItem->downloadStatus == ZQV_DOWNLOADED) {
+    ZQV_TRACE("downloaded icon:%s", zqvDownloadedLargeFrames[0]);
+  }
+}
+
+/// Null shows no icon. The same frames again do not restart a running animation.
+void ZQVFullView::_showTitleIcon(const char** frames) {
+  if (frames == _titleFrames || !_titleLayout) return;
+  _titleFrames = frames;
+  Evas_Object* icon =
+      frames ? ZQViewerCommon::getInstance().createGif(_titleLayout, frames) : nullptr;
+  elm_object_part_content_set(_titleLayout, "content", icon);
+}
+
+void ZQVFullView::_updateDownloadedStatus() {
+  if (!_curItem) {
+    ZQV_ERROR("_curItem is NULL");
+    return;
+  }
+  if (_isSentShare()) {
+    _updateSentStatus();
+    return;
+  }
+  switch (_curItem->downloadStatus) {
+    case ZQV_DOWNLOADING:
+      setButton(_toolButton, kDownload, false);
+      _showTitleIcon(zqvDownloadingLargeFrames);
+      break;
+    case ZQV_DOWNLOADED:
+      setButton(_toolButton, kOpen, true);
+      _showTitleIcon(zqvDownloadedLargeFrames);
+      break;
+    default:
+      setButton(_toolButton, kDownload, true);
+      _showTitleIcon(nullptr);
+  }
+}
+
+void ZQVFullView::_updateSentStatus() {
+  if (!_curItem->filePath) {
+    ZQV_ERROR("_curItem->filePath is NULL");
+    return;
+  }
+  elm_object_disabled_set(_toolButton, _isInServiceFolder(*_curItem) || _curItem->noThumbnail);
+}
+
+bool ZQVFullView::_isInServiceFolder(const ZQViewerThumbnailItem& item) const {
+  if (!item.filePath || !item.fileName) return false;
+  return std::string(kServiceFolder) + item.fileName == item.filePath;
+}
+
+void ZQVFullView::_downloadSignalCb(const char* member, const char* url) {
+  Evas_Object* pager = _grid.get();
+  Elm_Object_Item* cell = pager ? elm_gengrid_first_item_get(pager) : nullptr;
+  for (; cell; cell = elm_gengrid_item_next_get(cell)) {
+    auto* item = static_cast<ZQViewerThumbnailItem*>(elm_object_item_data_get(cell));
+    if (!item || !isSameAddress(item->downloadUrl, url)) continue;
+    // The page below follows the signals, too: the status may be the new one already.
+    item->downloadStatus = ZQVDownloadSignals::statusOf(member);
+    zqvSetAccessibleName(cell, zqvCellName(*item));
+    if (item == _curItem) _updateDownloadedStatus();
+    return;
+  }
+}
+
+/// A hand-over takes every checked file; this page never leaves more than one check behind.
+void ZQVFullView::_markForDownload(ZQViewerThumbnailItem* item) {
+  _clearMark();
+  item->checked = true;
+  _markedItem = item;
+}
+
+void ZQVFullView::_clearMark() {
+  if (_markedItem) _markedItem->checked = false;
+  _markedItem = nullptr;
+}
+
+void ZQVFullView::_downloadCurrent() {
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_FOREACH(_items, node, data) {
+    auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    if (!item || !isSameAddress(item->downloadUrl, _curItem->downloadUrl)) continue;
+    _markForDownload(item);
+    break;
+  }
+  _downloadFile(this, _curItem);
+}
+
+void ZQVFullView::_openCurrent() {
+  std::string path;
+  if (_isSentShare()) {
+    if (_isInServiceFolder(*_curItem)) return;
+    if (!_curItem->filePath) {
+      ZQV_ERROR("_curItem->filePath is NULL");
+      return;
+    }
+    path = _curItem->filePath;
+  } else {
+    path = zqvDownloadedPath(*_curItem);
+  }
+  if (ecore_file_exists(path.c_str())) {
+    _openFile(path.c_str());
+  } else {
+    _offerDownloadAgain();
+  }
+}
+
+void ZQVFullView::_downloadFile(ZQVFullView* view, ZQViewerThumbnailItem* item) {
+  if (!item) {
+    ZQV_ERROR("item is NULL");
+    return;
+  }
+  if (!view) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  if (item->fileSize > ZQV_LARGEST_UNASKED_DOWNLOAD) {
+    view->_askBeforeDownload(item->fileSize);
+  } else if (zqvNetworkAllowsDownload(false)) {
+    view->_handOver();
+  } else {
+    view->_clearMark();
+  }
+}
+
+void ZQVFullView::_handOver() {
+  ZQVDownloadMgr download(_items, _isWifiOnly, ZQV_FROM_FULL_VIEW, _sender.c_str(), _token.c_str());
+  download._downloadMgrCreate();
+  // A later download must not carry this file again.
+  _clearMark();
+}
+
+void ZQVFullView::_askBeforeDownload(uint32_t size) {
+  if (_wifiPopup) return;
+  auto* popup = new ZQVWifiSelectPopup(size, &_wifiPopup);
+  _wifiPopup = popup;
+  popup->setDownloadCb([this, popup](bool*) { _downloadRequest(this, popup); });
+  attachPopup(popup);
+}
+
+void ZQVFullView::_offerDownloadAgain() {
+  if (_unablePopup) return;
+  auto* popup = new ZQVUnableOpenFilePopup(&_unablePopup);
+  _unablePopup = popup;
+  popup->setDownloadCb([this](bool*) {
+    if (_curItem) _markForDownload(_curItem);
+    _downloadFile(this, _curItem);
+  });
+  attachPopup(popup);
+}
+
+void ZQVFullView::_openFile(const char* path) {
+  if (!path) {
+    ZQV_ERROR("fileUrl is NULL");
+    return;
+  }
+  ZQVOwnedAppControl request;
+  if (app_control_create(ZQVOut(request)) != APP_CONTROL_ERROR_NONE) return;
+  if (!launchViewer(request.get(), path)) {
+    zqvPostStatusMessage("IDS_RSH_TPOP_UNABLE_TO_FIND_APPLICATION_TO_PERFORM_THIS_ACTION");
+  }
+  ZQVOrlantLog::getInstance().insertFullOpenContentstype(path);
+}
+
+/// The last file with this number, null when there is none.
+ZQViewerThumbnailItem* ZQVFullView::_itemOfPage(int page) const {
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_REVERSE_FOREACH(_items, node, data) {
+    auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    if (item && item->index == page) return item;
+  }
+  return nullptr;
+}

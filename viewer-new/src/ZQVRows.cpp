@@ -1,0 +1,49 @@
+#include "ZQVRows.h"
+
+#include <glib.h>
+
+#include <cstring>
+
+#include "ZQVText.h"
+
+extern "C" {
+/// The device's toolkit has this; the one of a desktop realises all rows in sight anyway.
+void elm_genlist_realization_mode_set(Evas_Object* list, Eina_Bool mode) __attribute__((weak));
+}
+
+Elm_Genlist_Item_Class zqvRowClass(const char* style, Elm_Gen_Item_Text_Get_Cb text,
+                                   Elm_Gen_Item_Content_Get_Cb content, Elm_Gen_Item_Del_Cb del) {
+  Elm_Genlist_Item_Class rowClass{};
+  rowClass.item_style = style;
+  rowClass.func.text_get = text;
+  rowClass.func.content_get = content;
+  rowClass.func.del = del;
+  return rowClass;
+}
+
+bool zqvIsOneOf(const char* part, std::initializer_list<const char*> parts) {
+  for (const char* candidate : parts) {
+    if (g_strcmp0(part, candidate) == 0) return true;
+  }
+  return false;
+}
+
+char* zqvRowText(const char* id) {
+  return id ? strdup(zqvText(id)) : nullptr;
+}
+
+Elm_Object_Item* zqvAppendRow(Evas_Object* list, app_assist::WGenlistItem* row,
+                              Evas_Smart_Cb selected, void* data) {
+  Elm_Object_Item* item = elm_genlist_item_append(list, row->getItemClass(), row, nullptr,
+                                                  ELM_GENLIST_ITEM_NONE, selected, data);
+  if (item) {
+    row->setElmObjectItem(item);
+  } else {
+    delete row;
+  }
+  return item;
+}
+
+void zqvRealizeAllRows(Evas_Object* list) {
+  if (elm_genlist_realization_mode_set) elm_genlist_realization_mode_set(list, EINA_TRUE);
+}
