@@ -1,0 +1,9 @@
+#pragma once
+
+#include <net_connection.h>
+
+#include <optional>
+
+/// The type of the primary connection as NetworkManager has it; nothing when it does not run or
+/// does not answer within a second.
+std::optional<connection_type_e> typeFromNetworkManager();
