@@ -20,6 +20,15 @@ constexpr const char* kPlatform = "sys_string";
 constexpr std::array kLanguages{"en", "de", "fr",    "es", "pt", "ru",
                                 "ko", "ja", "zh_CN", "ar", "he", "hi"};
 
+struct Domain {
+  const char* name;
+  const char* folder;
+};
+constexpr std::array kDomains{
+    Domain{kViewer, IMAGE_DIR "/apps/com.orlant.zelqo/res/locale"},
+    Domain{kPlatform, IMAGE_DIR "/share/locale"},
+};
+
 /// An identifier and the printf arguments its callers pass: s for text, d for int.
 struct Message {
   const char* domain;
@@ -99,10 +108,10 @@ class Catalogue : public testing::TestWithParam<const char*> {
   static void SetUpTestSuite() {
     // In the plain C locale gettext translates nothing; in this one it follows LANGUAGE.
     ASSERT_TRUE(setlocale(LC_ALL, "C.UTF-8"));
-    bindtextdomain(kViewer, IMAGE_DIR "/apps/com.orlant.zelqo/res/locale");
-    bindtextdomain(kPlatform, IMAGE_DIR "/share/locale");
-    bind_textdomain_codeset(kViewer, "UTF-8");
-    bind_textdomain_codeset(kPlatform, "UTF-8");
+    for (const Domain& domain : kDomains) {
+      bindtextdomain(domain.name, domain.folder);
+      bind_textdomain_codeset(domain.name, "UTF-8");
+    }
   }
 
   void SetUp() override {
@@ -131,10 +140,10 @@ TEST_P(Catalogue, TakesExactlyTheArgumentsThatTheCallersPass) {
 
 TEST_P(Catalogue, IsUtf8InItsOwnLanguage) {
   const std::string language = std::string("Language: ") + GetParam() + "\n";
-  for (const char* domain : {kViewer, kPlatform}) {
-    const char* header = dgettext(domain, "");
-    EXPECT_NE(strstr(header, "charset=UTF-8"), nullptr) << domain;
-    EXPECT_NE(strstr(header, language.c_str()), nullptr) << domain;
+  for (const Domain& domain : kDomains) {
+    const char* header = dgettext(domain.name, "");
+    EXPECT_NE(strstr(header, "charset=UTF-8"), nullptr) << domain.name;
+    EXPECT_NE(strstr(header, language.c_str()), nullptr) << domain.name;
   }
   for (const Message& message : kMessages) {
     EXPECT_TRUE(g_utf8_validate(dgettext(message.domain, message.id), -1, nullptr)) << message.id;
@@ -187,7 +196,7 @@ INSTANTIATE_TEST_SUITE_P(Languages, Catalogue, testing::ValuesIn(kLanguages),
 // Guards the tests above: languages that fall back to each other would all pass.
 TEST(Catalogues, DifferFromEachOther) {
   setlocale(LC_ALL, "C.UTF-8");
-  bindtextdomain(kViewer, IMAGE_DIR "/apps/com.orlant.zelqo/res/locale");
+  bindtextdomain(kViewer, kDomains[0].folder);
   std::vector<std::string> seen;
   for (const char* language : kLanguages) {
     setenv("LANGUAGE", language, 1);
