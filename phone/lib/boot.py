@@ -15,7 +15,6 @@ from lib import environment, image, leftovers, sandbox
 from lib.report import Failure
 from lib.state import ROOT
 
-_PATIENCE = 20  # seconds; only a broken phone takes that long
 _PR_SET_PDEATHSIG, _PR_SET_CHILD_SUBREAPER = 1, 36
 
 
@@ -83,7 +82,7 @@ def _keep(state, settings, unboxed, told):
     status = 1
     try:
         os.setsid()
-        _become_daemon(state)
+        _become_daemon(state, told)
         supervisor = _supervisor(state, settings, unboxed, told)
         os.close(told)
         for number in (signal.SIGTERM, signal.SIGINT, signal.SIGHUP):
@@ -97,16 +96,34 @@ def _keep(state, settings, unboxed, told):
     finally:
         if unboxed:
             leftovers.end(state)
+            _reap()
             sandbox.Machine.give_back(state)
         os._exit(status & 0xFF)
 
 
-def _become_daemon(state):
+def _reap():
+    """Without a sandbox the keeper inherits what its children leave behind."""
+    try:
+        while os.waitpid(-1, os.WNOHANG) != (0, 0):
+            pass
+    except ChildProcessError:
+        pass
+
+
+def _become_daemon(state, told):
+    """Keeps nothing of its caller: a pipe held open would make the caller's reader wait."""
     log = os.open(state.path("log", "supervisor.log"), os.O_WRONLY | os.O_CREAT | os.O_TRUNC, 0o644)
     null = os.open(os.devnull, os.O_RDONLY)
     os.dup2(null, 0)
     os.dup2(log, 1)
     os.dup2(log, 2)
+    keep = {0, 1, 2, told, state.lock_file()}
+    for name in os.listdir("/proc/self/fd"):
+        if int(name) not in keep:
+            try:
+                os.close(int(name))
+            except OSError:
+                pass
     os.chdir(state.folder)
     sys.stdout = sys.stderr = open(2, "w", buffering=1, encoding="utf-8", closefd=False)
 

@@ -4,7 +4,6 @@ import os
 import subprocess
 
 from lib.report import Failure
-from lib.state import VIEWER  # noqa: F401
 
 _CONFIGURATION = """<busconfig>
 <type>{kind}</type><listen>unix:path={run}/{kind}.bus</listen><auth>EXTERNAL</auth>

@@ -81,17 +81,16 @@ def _place(source, target):
 
 
 def bus_name(application):
-    """The name under which an application is reached on the session bus."""
-    text = ""
+    """The name under which an application is reached on the session bus. A letter comes before
+    every id, since an id may begin with a digit; what a bus name may not hold stands as _xx."""
+    text, before = "phoneapp.i", ""
     for byte in application.encode():
         letter = chr(byte)
-        if letter.isdigit() and letter.isascii():
-            text += "_" + letter if text.endswith(".") else letter
-        elif letter.isascii() and (letter.isalpha() or letter in "-._"):
-            text += letter
-        else:
-            text += f"_{byte:02x}"
-    return "phoneapp.i" + text
+        plain = letter.isascii() and (letter.isalpha() or letter == "-" or
+                                      ((letter.isdigit() or letter == ".") and before != "."))
+        text += letter if plain else f"_{byte:02x}"
+        before = letter if plain else ""
+    return text[:-1] + "_2e" if before == "." else text
 
 
 def _announce(state):

@@ -11,8 +11,14 @@ from lib.state import State
 # command: module that has a function of that name, called with (state, arguments)
 COMMANDS = {
     "up": "power", "down": "power", "status": "power",
-    "shell": "shell",
+    "share": "share",
+    "launch": "application", "log": "application", "launches": "application",
+    "usage": "application", "prefs": "application",
     "screenshot": "screen",
+    "network": "world", "rotate": "world", "signal": "world", "signals": "world",
+    "clock": "world", "language": "world", "account": "world", "service": "world",
+    "contact": "world",
+    "shell": "shell",
 }
 USAGE = "phone [--state DIR] COMMAND; commands: " + ", ".join(COMMANDS)
 

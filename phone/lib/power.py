@@ -17,7 +17,7 @@ def up(state, args):
                     flags=("headless",), usage=_UP)
     settings = {
         "screen": _screen(options.get("screen", "720x1280")),
-        "language": _locale(options.get("lang", "en_US.UTF-8")),
+        "language": locale(options.get("lang", "en_US.UTF-8")),
         "number": _subscriber(options.get("number", "+821012345678")),
         "service": options.get("service"),
         "build": find_build(options.get("build")),
@@ -40,7 +40,7 @@ def _screen(text):
             number(height, "the height of --screen", 240, 4096)]
 
 
-def _locale(text):
+def locale(text):
     """de_DE stands for de_DE.UTF-8; nothing but letters, digits and . _ - @ gets further."""
     if not text or not all(letter.isalnum() or letter in "._-@" for letter in text):
         raise Usage(f"'{text}' is not a locale; one is like de_DE.UTF-8")

@@ -66,6 +66,9 @@ class State:
                     return False
                 time.sleep(0.01)
 
+    def lock_file(self):
+        return self._lock
+
     def unlock(self):
         if self._lock is not None:
             os.close(self._lock)

@@ -10,7 +10,7 @@ from lib import buses, environment, link, server
 from lib.program import Program
 from lib.report import Failure
 from lib.sharing import Sharing
-from lib.state import ROOT, VIEWER, State
+from lib.state import ROOT, State
 
 _EDS = ("org.gnome.evolution.dataserver.Sources5", "org.gnome.evolution.dataserver.AddressBook10")
 
@@ -99,9 +99,6 @@ class Phone:
         self._start_window_manager()
 
     def _start_window_manager(self):
-        ours, theirs = os.pipe2(os.O_CLOEXEC)
-        os.close(ours)
-        os.close(theirs)
         manager = self.program("window-manager", [
             "openbox", "--sm-disable", "--config-file", os.path.join(ROOT, "phone/etc/openbox.xml"),
             "--startup", "echo ready"])
@@ -115,7 +112,7 @@ class Phone:
         self.vital(buses.start(self, "system"))
         world = self.tool("phone-world")
         if world:
-            self.program("world", [world]).start_and_read()
+            self.program("world", [world, self.settings["number"]]).start_and_read()
         recorder = self.tool("phone-signal")
         if recorder:
             self.program("signals", [recorder, "--record", os.path.join(self.run, "signals")]) \

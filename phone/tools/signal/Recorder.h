@@ -1,0 +1,22 @@
+// Writes down every signal that is seen on the system bus, one JSON object per line.
+#pragma once
+
+#include <base/Bus.h>
+
+#include <cstdio>
+#include <memory>
+
+class Recorder {
+ public:
+  /// Appends to the file; check isOpen().
+  Recorder(base::OwnedBus bus, const char* file);
+
+  bool isOpen() const { return _file != nullptr; }
+
+ private:
+  static void _signalCb(GDBusConnection*, const char* sender, const char* path,
+                        const char* interface, const char* member, GVariant* body, gpointer self);
+
+  base::Owned<FILE, fclose> _file;
+  base::SignalSubscription _signals;
+};

@@ -1,0 +1,57 @@
+// phone-world [NUMBER]: the services of the phone's system bus that a real phone has from its
+// hardware and its operating system. Prints "ready" when all of them can be reached.
+
+#include <base/Bus.h>
+
+#include <cstdio>
+
+#include "Clock.h"
+#include "Control.h"
+#include "Modem.h"
+#include "Network.h"
+#include "OrientationSensor.h"
+
+namespace {
+
+bool own(GDBusConnection* bus, const char* name) {
+  base::OwnedError error;
+  const base::OwnedVariant answer(g_dbus_connection_call_sync(
+      bus, "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "RequestName",
+      g_variant_new("(su)", name, 4u /* do not queue */), G_VARIANT_TYPE("(u)"),
+      G_DBUS_CALL_FLAGS_NONE, -1, nullptr, base::Out(error)));
+  guint32 result = 0;
+  if (answer) g_variant_get(answer.get(), "(u)", &result);
+  if (result == 1) return true;
+  fprintf(stderr, "phone-world: %s is taken\n", name);
+  return false;
+}
+
+bool ownAll(GDBusConnection* bus) {
+  for (const char* name :
+       {"org.freedesktop.NetworkManager", "net.hadess.SensorProxy", "org.freedesktop.timedate1",
+        "org.freedesktop.ModemManager1", "phone.World"}) {
+    if (!own(bus, name)) return false;
+  }
+  return true;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  const base::OwnedBus bus = base::systemBus();
+  if (!bus) return 1;
+  Network network(bus.get());
+  OrientationSensor sensor(bus.get());
+  Clock clock(bus.get());
+  Modem modem(bus.get(), argc > 1 ? argv[1] : "");
+  Control control(bus.get(), network, sensor);
+  if (!network.publish() || !sensor.publish() || !clock.publish() || !modem.publish() ||
+      !control.publish() || !ownAll(bus.get())) {
+    return 1;
+  }
+  puts("ready");
+  fflush(stdout);
+  const base::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
+  g_main_loop_run(loop.get());
+  return 0;
+}
