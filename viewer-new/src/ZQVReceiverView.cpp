@@ -1,0 +1,290 @@
+#include "ZQVReceiverView.h"
+
+#include <system_settings.h>
+#include <unicode/ustring.h>
+#include <vconf.h>
+
+#include "ZQVAccess.h"
+#include "ZQVCommon.h"
+#include "ZQVFullView.h"
+#include "ZQVLog.h"
+#include "ZQVMarkup.h"
+#include "ZQVOwned.h"
+#include "ZQVSelectView.h"
+#include "ZQVStatusMessage.h"
+#include "ZQVText.h"
+#include "ZQVThumbItem.h"
+
+namespace {
+
+constexpr size_t kTextLimit = 512;
+constexpr const char* kRegionFormat = "db/menu_widget/regionformat";
+constexpr const char* kDownloadText = "IDS_RSH_BUTTON_DOWNLOAD_ABB3";
+
+const char* nonNull(const char* text) {
+  return text ? text : "";
+}
+
+}  // namespace
+
+ZQVReceiverView::ZQVReceiverView(Eina_List* items, bool isSingleShare, uint64_t totalSize,
+                                 uint64_t expiry, const char* senderName, const char* contentsToken)
+    : _items(items),
+      _isSingleShare(isSingleShare),
+      _totalSize(totalSize),
+      _expiry(expiry),
+      _grid(items, ZQV_VIEW_RECEIVER),
+      _senderName(nonNull(senderName)),
+      _contentsToken(nonNull(contentsToken)) {}
+
+ZQVReceiverView::~ZQVReceiverView() {
+  _signals.stop();
+  _filler.stop();
+  if (_grid.get()) {
+    evas_object_event_callback_del_full(_grid.get(), EVAS_CALLBACK_DEL, _gridDeletedCb, this);
+  }
+  // Who was sent here for one share goes back to where they came from.
+  if (_isSingleShare) ZQViewerCommon::getInstance().safeExit(_window);
+}
+
+const char* ZQVReceiverView::getClassName() {
+  return "ZQVReceiverView";
+}
+
+Evas_Object* ZQVReceiverView::onCreateView(Evas_Object* parent, void*) {
+  if (!parent) {
+    ZQV_ERROR("parent is NULL");
+    return nullptr;
+  }
+  _window = elm_object_top_widget_get(parent);
+  setTitle(_titleText().c_str());
+  Evas_Object* layout = ZQViewerCommon::getInstance().createLayout(
+      parent, _isSingleShare ? "receiver_viewer_shared_file_thumbnail_layout_4line"
+                             : "receiver_viewer_shared_file_thumbnail_layout_2line");
+
+  _label = elm_label_add(layout);
+  elm_object_style_set(_label, "popup/default");
+  elm_label_line_wrap_set(_label, ELM_WRAP_MIXED);
+  elm_object_text_set(_label, ZQVOwnedText(getSummaryText()).get());
+  elm_object_part_content_set(layout, "elm.swallow.label.text", _label);
+
+  Evas_Object* grid = _grid.createVertical(parent, nullptr);
+  evas_object_event_callback_add(grid, EVAS_CALLBACK_DEL, _gridDeletedCb, this);
+  elm_object_part_content_set(layout, "elm.swallow.gengrid.layout", grid);
+  _launchDbusMonitor();
+  return layout;
+}
+
+void ZQVReceiverView::onCreated() {
+  _filler.start(_items,
+                [this](ZQViewerThumbnailItem* item) { _grid.append(item, _gridItemCb, this); });
+}
+
+Elm_Object_Item* ZQVReceiverView::onPushToNaviframe(Evas_Object* naviframe) {
+  Evas_Object* back = elm_button_add(naviframe);
+  elm_object_style_set(back, "naviframe/end_btn/default");
+  evas_object_smart_callback_add(back, "clicked", _backButtonCb, this);
+  zqvSetAccessibleName(back, zqvText("back"));
+  return elm_naviframe_item_push(naviframe, getTitle(), back, nullptr, getEvasObj(), nullptr);
+}
+
+void ZQVReceiverView::onPushed(Elm_Object_Item* item) {
+  elm_object_item_domain_text_translatable_set(item, ZQV_TEXT_DOMAIN, EINA_TRUE);
+  Evas_Object* download = elm_button_add(elm_object_item_widget_get(item));
+  elm_object_style_set(download, "bottom");
+  elm_object_domain_translatable_text_set(download, ZQV_TEXT_DOMAIN, kDownloadText);
+  evas_object_smart_callback_add(download, "clicked", _downloadBtnCb, this);
+  elm_object_item_part_content_set(item, "toolbar", download);
+  _rotation.connect(_window, "rotation,changed", _rotateCb, this);
+  _updateToolbarState();
+}
+
+bool ZQVReceiverView::onPop() {
+  _filler.stop();
+  _grid.forgetCells();
+  return true;
+}
+
+/// A status may have changed while another page was on top.
+void ZQVReceiverView::onBecomeTop() {
+  _updateCells();
+  _updateToolbarState();
+}
+
+void ZQVReceiverView::resetViewType(Evas_Object* grid) {
+  evas_object_data_set(grid, "ViewType", nullptr);
+}
+
+void ZQVReceiverView::setName(const char* name) {
+  _senderName = nonNull(name);
+}
+
+void ZQVReceiverView::update(int key) {
+  if (key != SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE) return;
+  const std::string title = _titleText();
+  setTitle(title.c_str());
+  elm_object_item_domain_translatable_text_set(getNaviItem(), ZQV_TEXT_DOMAIN, title.c_str());
+  elm_object_text_set(_label, ZQVOwnedText(getSummaryText()).get());
+  _updateCells();
+  Evas_Object* download = _toolbarButton();
+  if (!download) {
+    ZQV_ERROR("toolbar part object is null!");
+    return;
+  }
+  elm_object_domain_translatable_text_set(download, ZQV_TEXT_DOMAIN, kDownloadText);
+}
+
+char* ZQVReceiverView::getSummaryText() const {
+  std::string text = _sizeLine() + "<br>" + _expiryLine();
+  if (_isSingleShare) text += "<br><br>" + _hint();
+  return ZQViewerCommon::getInstance().makeThemeMarkup(text.c_str(), "T024", "left");
+}
+
+std::string ZQVReceiverView::_titleText() const {
+  return zqvFormatName("IDS_RSH_HEADER_FILES_SHARED_BY_PS_ABB", _senderName.c_str(),
+                       kTextLimit - 1);
+}
+
+std::string ZQVReceiverView::_sizeLine() const {
+  float value = 0;
+  const ZQVOwnedText unit(
+      ZQViewerCommon::getInstance().zquiCommonConvertFileSizeUnit(_totalSize, &value));
+  char number[10] = {};
+  g_snprintf(number, sizeof number, "%.2f", static_cast<double>(value));
+  const int count = static_cast<int>(eina_list_count(_items));
+  if (count == 1) {
+    return zqvFormat("IDS_RSH_SBODY_1_FILE_HP1SS_P2SS_ABB", "ss", number, unit.get());
+  }
+  return zqvFormat("IDS_RSH_SBODY_P1SD_FILES_HP2SS_P3SS_ABB", "dss", count, number, unit.get());
+}
+
+std::string ZQVReceiverView::_expiryLine() const {
+  const ZQVOwned<char, free> region(vconf_get_str(kRegionFormat));
+  // The first three letters only: the day is shown without the time.
+  UChar skeleton[16] = {};
+  u_uastrncpy(skeleton, "yMdHm", 3);
+  const ZQVOwnedText date(ZQViewerCommon::getInstance().getDateString(
+      region.get(), skeleton, static_cast<double>(_expiry)));
+  return zqvFormat("IDS_RSH_BODY_EXPIRED_ON_PS", "s", nonNull(date.get()));
+}
+
+std::string ZQVReceiverView::_hint() const {
+  return zqvText(eina_list_count(_items) < 2
+                     ? "IDS_RSH_BODY_TO_DOWNLOAD_THIS_FILE_LATER_GO_TO_MY_FILES_SHARING_HISTORY_"
+                       "THEN_SELECT_THIS_MESSAGE"
+                     : "IDS_RSH_BODY_TO_DOWNLOAD_THESE_FILES_LATER_GO_TO_MY_FILES_SHARING_HISTORY_"
+                       "THEN_SELECT_THIS_MESSAGE");
+}
+
+void ZQVReceiverView::_launchDbusMonitor() {
+  _signals.start([this](const char* member, const char* url) { _downloadSignalCb(member, url); });
+}
+
+void ZQVReceiverView::_downloadSignalCb(const char* member, const char* url) {
+  const int32_t status = ZQVDownloadSignals::statusOf(member);
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_FOREACH(_items, node, data) {
+    auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    Elm_Object_Item* cell = item ? item->gridItems[ZQV_VIEW_RECEIVER] : nullptr;
+    if (!cell || g_strcmp0(item->downloadUrl, url) != 0) continue;
+    if (item->downloadStatus != status) {
+      item->downloadStatus = status;
+      elm_gengrid_item_update(cell);
+      zqvSetAccessibleName(cell, zqvCellName(*item));
+    }
+    break;
+  }
+  _updateToolbarState();
+}
+
+void ZQVReceiverView::_gridItemCb(void* data, Evas_Object*, void* cell) {
+  if (!cell) {
+    ZQV_ERROR("event_info is NULL");
+    return;
+  }
+  auto* item = static_cast<Elm_Object_Item*>(cell);
+  elm_gengrid_item_selected_set(item, EINA_FALSE);
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  static_cast<ZQVReceiverView*>(data)->_openFullView(item);
+}
+
+void ZQVReceiverView::_openFullView(Elm_Object_Item* cell) {
+  auto* view =
+      new ZQVFullView(_items, ZQV_VIEW_FULL_RECEIVER, _senderName.c_str(), _contentsToken.c_str());
+  getNaviframe()->push(view, elm_object_item_data_get(cell), "fullview");
+}
+
+void ZQVReceiverView::_downloadBtnCb(void* data, Evas_Object*, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  static_cast<ZQVReceiverView*>(data)->_openSelectView();
+}
+
+void ZQVReceiverView::_openSelectView() {
+  if (ZQViewerCommon::getInstance().zquiCommonCheckNetwork() == 0) {
+    ZQV_ERROR("No network");
+    zqvPostStatusMessage(
+        "IDS_MF_POP_MOBILE_DATA_IS_TURNED_OFF_CONNECT_TO_A_WI_FI_NETWORK_INSTEAD_MSG");
+    return;
+  }
+  getNaviframe()->push(new ZQVSelectView(_items, _senderName.c_str(), _contentsToken.c_str()));
+}
+
+void ZQVReceiverView::_backButtonCb(void* data, Evas_Object*, void*) {
+  if (!data) {
+    ZQV_ERROR("data is NULL");
+    return;
+  }
+  static_cast<ZQVReceiverView*>(data)->getNaviframe()->pop();
+}
+
+void ZQVReceiverView::_rotateCb(void* data, Evas_Object* window, void*) {
+  if (!data || !window) {
+    ZQV_ERROR("data || !obj");
+    return;
+  }
+  auto* view = static_cast<ZQVReceiverView*>(data);
+  if (view->_grid.get()) view->_grid.fitCells(window);
+}
+
+void ZQVReceiverView::_gridDeletedCb(void* data, Evas*, Evas_Object* grid, void*) {
+  static_cast<ZQVReceiverView*>(data)->resetViewType(grid);
+}
+
+/// What has been downloaded can be downloaded again; only what is on its way cannot.
+void ZQVReceiverView::_updateToolbarState() {
+  bool any = false;
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_FOREACH(_items, node, data) {
+    const auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    any = any || (item && (item->downloadStatus == ZQV_NOT_DOWNLOADED ||
+                           item->downloadStatus == ZQV_DOWNLOADED));
+  }
+  Evas_Object* download = _toolbarButton();
+  if (download) elm_object_disabled_set(download, !any);
+}
+
+void ZQVReceiverView::_updateCells() {
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_FOREACH(_items, node, data) {
+    const auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    Elm_Object_Item* cell = item ? item->gridItems[ZQV_VIEW_RECEIVER] : nullptr;
+    if (!cell) continue;
+    elm_gengrid_item_fields_update(cell, "elm.swallow.end", ELM_GENGRID_ITEM_FIELD_CONTENT);
+    elm_gengrid_item_fields_update(cell, "elm.swallow.icon", ELM_GENGRID_ITEM_FIELD_CONTENT);
+    zqvSetAccessibleName(cell, zqvCellName(*item));
+  }
+}
+
+Evas_Object* ZQVReceiverView::_toolbarButton() const {
+  Elm_Object_Item* item = getNaviItem();
+  return item ? elm_object_item_part_content_get(item, "toolbar") : nullptr;
+}

@@ -1,0 +1,111 @@
+#include "ZQVSmallCell.h"
+
+#include <glib.h>
+
+#include <cstring>
+
+#include "ZQVCellParts.h"
+#include "ZQVCommon.h"
+#include "ZQVFrames.h"
+#include "ZQVIcons.h"
+#include "ZQVLog.h"
+#include "ZQVMarkup.h"
+#include "ZQVOwned.h"
+#include "ZQVPictureGate.h"
+#include "ZQVThumbItem.h"
+
+namespace {
+
+/// Leaves room for the tags in the markup's buffer.
+constexpr size_t kLongestName = 768;
+constexpr int kPrescale = 32;
+
+int viewTypeOf(Evas_Object* grid) {
+  return GPOINTER_TO_INT(evas_object_data_get(grid, "ViewType"));
+}
+
+Evas_Object* createCheck(const ZQViewerThumbnailItem* item, Evas_Object* grid) {
+  Evas_Object* check = elm_check_add(grid);
+  elm_check_state_set(check, item->checked);
+  // The check only shows the state: taps are for the cell.
+  evas_object_repeat_events_set(check, EINA_TRUE);
+  evas_object_propagate_events_set(check, EINA_FALSE);
+  evas_object_show(check);
+  return check;
+}
+
+/// The picture to show; a file that may not be shown counts as not there.
+std::string pictureOf(const ZQViewerThumbnailItem* item) {
+  if (ZQVPictureGate::passes(item->thumbPath, ZQVPictureGate::Thumbnail)) return item->thumbPath;
+  if (!item->mimeType) return ZQV_SMALL_IMG_ICON;
+  const ZQVOwnedText icon(ZQVIcons::_getOthersIconPath(item->mimeType, true));
+  return icon.get();
+}
+
+void addName(const ZQViewerThumbnailItem* item, Evas_Object* layout, bool dimmed) {
+  auto& common = ZQViewerCommon::getInstance();
+  const std::string name = zqvEscapeWithin(item->fileName, kLongestName);
+  const ZQVOwnedText markup(common.makeThemeMarkup(name.c_str(), "T034L2", "center"));
+  Evas_Object* label = zqvCreateLabel(layout, markup.get());
+  if (dimmed) common.dimObject(label);
+  elm_object_part_content_set(layout, "filename", label);
+}
+
+void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
+  const bool sender = viewTypeOf(grid) == ZQV_VIEW_SENDER;
+  const std::string path = pictureOf(item);
+  const bool isDefault = path == ZQV_SMALL_IMG_ICON;
+  const bool dimmed = sender && (isDefault || path != (item->thumbPath ? item->thumbPath : ""));
+
+  Evas_Object* icon = ZQViewerCommon::getInstance().createIcon(grid, path.c_str());
+  elm_image_fill_outside_set(icon, EINA_TRUE);
+  elm_image_preload_disabled_set(icon, EINA_FALSE);
+  elm_image_prescale_set(icon, kPrescale);
+  if (dimmed) ZQViewerCommon::getInstance().dimObject(icon);
+
+  if (item->thumbUrl || !item->fileName) {
+    elm_object_part_content_set(layout, !sender && isDefault ? "default_thumbnail" : "thumbnail",
+                                icon);
+    return;
+  }
+  elm_object_part_content_set(layout, "logo", icon);
+  addName(item, layout, dimmed);
+}
+
+void addVideoMarks(Evas_Object* grid, Evas_Object* layout) {
+  zqvAddColouredIcon(grid, layout, "playicon", ZQV_FILE_ICON_DIR "80x80/zq_file_ic_video_play.png",
+                     "AO015");
+  zqvAddColouredIcon(grid, layout, "playiconBG", ZQV_FILE_ICON_DIR "80x80/zq_file_ic_video_bg.png",
+                     "W025");
+  zqvAddColouredIcon(grid, layout, "playiconEF", ZQV_FILE_ICON_DIR "80x80/zq_file_ic_video_ef.png",
+                     "W026");
+}
+
+void addDownloadStatus(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
+  const char** frames = nullptr;
+  if (item->downloadStatus == ZQV_DOWNLOADED) frames = zqvDownloadedSmallFrames;
+  if (item->downloadStatus == ZQV_DOWNLOADING) frames = zqvDownloadingSmallFrames;
+  if (!frames) return;
+  Evas_Object* status = ZQViewerCommon::getInstance().createGif(grid, frames);
+  elm_object_part_content_set(layout, "downstatus", status);
+}
+
+}  // namespace
+
+Evas_Object* ZQVSmallCell::__getContent(const ZQViewerThumbnailItem* item, Evas_Object* grid,
+                                        const char* part) {
+  if (!item || !grid || !part) {
+    ZQV_ERROR("!data || !obj || !part");
+    return nullptr;
+  }
+  const int viewType = viewTypeOf(grid);
+  if (strcmp(part, "elm.swallow.end") == 0) {
+    return viewType == ZQV_VIEW_SELECT ? createCheck(item, grid) : nullptr;
+  }
+  if (strcmp(part, "elm.swallow.icon") != 0) return nullptr;
+  Evas_Object* layout = ZQViewerCommon::getInstance().createLayout(grid, "griditem");
+  addPicture(item, grid, layout);
+  if (zqvContains(item->mimeType, "video/")) addVideoMarks(grid, layout);
+  if (viewType == ZQV_VIEW_RECEIVER) addDownloadStatus(item, grid, layout);
+  return layout;
+}

@@ -1,0 +1,6 @@
+#include "ZQVApp.h"
+
+int main(int argc, char** argv) {
+  ZQVApp app(argc, argv);
+  return app.start(argc, argv);
+}
