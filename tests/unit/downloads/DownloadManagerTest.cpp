@@ -25,6 +25,9 @@ class Recorder : public DownloadManager::Observer {
   void onStarted(const Download& download) override { events += "started " + download.name + ";"; }
   void onDone(const Download& download) override { events += "done " + download.name + ";"; }
   void onFailed(const Download& download) override { events += "failed " + download.name + ";"; }
+  void onCancelled(const Download& download) override {
+    events += "cancelled " + download.name + ";";
+  }
   void onChanged(const Download& download) override { received = download.received; }
   void onListChanged() override {}
 
@@ -332,7 +335,7 @@ TEST_F(Manager, RunsThreeAtATime) {
   manager->add(all);
   EXPECT_EQ(recorder.events, "started f0;started f1;started f2;");
   manager->cancel(manager->list().front()->id);
-  EXPECT_EQ(recorder.events, "started f0;started f1;started f2;started f3;");
+  EXPECT_EQ(recorder.events, "started f0;started f1;started f2;cancelled f0;started f3;");
 }
 
 TEST_F(Manager, LeavesNothingBehindWhenItIsCancelled) {

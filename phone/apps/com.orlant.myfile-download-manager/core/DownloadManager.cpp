@@ -200,6 +200,7 @@ void DownloadManager::cancel(std::int64_t id) {
   download.received = 0;
   download.state = State::Cancelled;
   _store(download);
+  _observer.onCancelled(download);
   _startWaiting();
 }
 

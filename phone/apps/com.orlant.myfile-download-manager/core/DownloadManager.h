@@ -34,6 +34,7 @@ class DownloadManager {
     /// The file lies under its final name and in the index.
     virtual void onDone(const Download& download) = 0;
     virtual void onFailed(const Download& download) = 0;
+    virtual void onCancelled(const Download& download) = 0;
     /// Progress or state of one download.
     virtual void onChanged(const Download& download) = 0;
     /// Downloads came or went.

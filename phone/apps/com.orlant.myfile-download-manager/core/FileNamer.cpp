@@ -1,8 +1,6 @@
 #include "FileNamer.h"
 
-#include <glib.h>
-
-#include <memory>
+#include "Owned.h"
 
 namespace downloads {
 namespace {
@@ -10,11 +8,6 @@ namespace {
 constexpr std::size_t kMaxBytes = 255;
 constexpr std::size_t kMaxExtensionBytes = 32;
 constexpr const char* kNameless = "file";
-
-struct FreeText {
-  void operator()(char* text) const { g_free(text); }
-};
-using OwnedText = std::unique_ptr<char, FreeText>;
 
 // Characters that draw nothing but change how the others are shown: with them "exe.jpg" can be the
 // picture of a name that ends in ".exe".

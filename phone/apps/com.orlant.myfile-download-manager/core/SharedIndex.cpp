@@ -6,7 +6,8 @@
 #include <unistd.h>
 
 #include <filesystem>
-#include <memory>
+
+#include "Owned.h"
 
 namespace downloads {
 namespace {
@@ -14,15 +15,7 @@ namespace {
 constexpr int kLockTries = 200;
 constexpr gulong kLockPauseUs = 10000;
 
-struct ReleaseNode {
-  void operator()(JsonNode* node) const { json_node_unref(node); }
-};
-using OwnedNode = std::unique_ptr<JsonNode, ReleaseNode>;
-
-struct FreeText {
-  void operator()(char* text) const { g_free(text); }
-};
-using OwnedText = std::unique_ptr<char, FreeText>;
+using OwnedNode = base::Owned<JsonNode, json_node_unref>;
 
 // Kept in a file of its own: the index itself is replaced on every change.
 class WriterLock {

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <base/Bus.h>
+
+#include <string>
+
+namespace downloads {
+
+/// Tells whoever shows a shared file how its download goes: signals on the system bus, with the
+/// file's address.
+class DownloadSignals {
+ public:
+  DownloadSignals() : _bus(base::systemBus()) {}
+
+  void downloading(const std::string& url) { _emit("file_downloading", url); }
+  void downloaded(const std::string& url) { _emit("file_downloaded", url); }
+  /// Failed or cancelled: it can be asked for again.
+  void failed(const std::string& url) { _emit("file_failed", url); }
+
+ private:
+  void _emit(const char* member, const std::string& url);
+
+  base::OwnedBus _bus;
+};
+
+}  // namespace downloads

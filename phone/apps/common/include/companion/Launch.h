@@ -1,0 +1,36 @@
+/// Launch requests as the phone's own applications send them.
+#pragma once
+
+#include <app_control.h>
+
+#include <base/Owned.h>
+
+#include <string>
+#include <type_traits>
+#include <vector>
+
+namespace companion {
+
+using OwnedRequest = base::Owned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
+
+/// Texts of a request; empty when it has none.
+std::string operationOf(app_control_h request);
+std::string extraOf(app_control_h request, const char* key);
+std::vector<std::string> extrasOf(app_control_h request, const char* key);
+
+/// Tells the sender how its request ended.
+void reply(app_control_h request, app_control_result_e result, const std::string& message = {});
+
+/// The viewer on a share; a message in the status bar when it cannot be started.
+void openReceivedShare(const std::string& token, bool single);
+void openSentShare(int requestId, bool single);
+
+/// The program of the phone that opens the file.
+void openFile(const std::string& path);
+
+/// An application's start page.
+void openApplication(const char* appId);
+
+void showMessage(const std::string& message);
+
+}  // namespace companion

@@ -1,0 +1,48 @@
+#include "companion/Text.h"
+
+#include <Elementary.h>
+#include <appfw/AppId.h>
+#include <base/Owned.h>
+#include <libintl.h>
+
+#include <cstdarg>
+#include <cstdlib>
+
+namespace companion {
+
+const char* text(const char* id) {
+  return dgettext(appfw::applicationId().c_str(), id);
+}
+
+std::string format(const char* id, ...) {
+  va_list arguments;
+  va_start(arguments, id);
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wformat-nonliteral"
+  const base::OwnedText line(g_strdup_vprintf(text(id), arguments));
+#pragma GCC diagnostic pop
+  va_end(arguments);
+  return line ? line.get() : "";
+}
+
+std::string sizeText(unsigned long long bytes) {
+  const base::OwnedText size(g_format_size(bytes));
+  return size.get();
+}
+
+std::string escape(const std::string& plain) {
+  const base::Owned<char, std::free> markup(
+      evas_textblock_text_utf8_to_markup(nullptr, singleLine(plain).c_str()));
+  return markup ? markup.get() : "";
+}
+
+std::string singleLine(const std::string& plain) {
+  const base::OwnedText valid(g_utf8_make_valid(plain.data(), static_cast<gssize>(plain.size())));
+  std::string line = valid.get();
+  for (char& c : line) {
+    if (static_cast<unsigned char>(c) < ' ') c = ' ';
+  }
+  return line;
+}
+
+}  // namespace companion
