@@ -1,0 +1,81 @@
+#include "JsonText.h"
+
+namespace zelqo {
+namespace {
+
+constexpr int kMaxDepth = 32;
+
+// The parser recurses without a limit of its own: a megabyte of brackets would end the process.
+bool isShallow(std::string_view text) {
+  int depth = 0;
+  bool quoted = false;
+  for (std::size_t i = 0; i < text.size(); i++) {
+    const char c = text[i];
+    if (quoted) {
+      if (c == '\\') i++;
+      if (c == '"') quoted = false;
+    } else if (c == '"') {
+      quoted = true;
+    } else if (c == '[' || c == '{') {
+      if (++depth > kMaxDepth) return false;
+    } else if (c == ']' || c == '}') {
+      depth--;
+    }
+  }
+  return true;
+}
+
+JsonNode* valueMember(JsonObject* object, const char* name) {
+  JsonNode* node = json_object_get_member(object, name);
+  return node && JSON_NODE_HOLDS_VALUE(node) ? node : nullptr;
+}
+
+}  // namespace
+
+JsonTree parseJsonObject(std::string_view text) {
+  if (!g_utf8_validate(text.data(), static_cast<gssize>(text.size()), nullptr) ||
+      !isShallow(text)) {
+    return nullptr;
+  }
+  const base::Owned<JsonParser, g_object_unref> parser(json_parser_new_immutable());
+  if (!json_parser_load_from_data(parser.get(), text.data(), static_cast<gssize>(text.size()),
+                                  nullptr)) {
+    return nullptr;
+  }
+  JsonTree root(json_parser_steal_root(parser.get()));
+  return root && JSON_NODE_HOLDS_OBJECT(root.get()) ? std::move(root) : nullptr;
+}
+
+std::optional<std::string> textMember(JsonObject* object, const char* name) {
+  JsonNode* node = valueMember(object, name);
+  if (!node || json_node_get_value_type(node) != G_TYPE_STRING) return std::nullopt;
+  return json_node_get_string(node);
+}
+
+std::optional<std::int64_t> numberMember(JsonObject* object, const char* name) {
+  JsonNode* node = valueMember(object, name);
+  if (!node || json_node_get_value_type(node) != G_TYPE_INT64) return std::nullopt;
+  return json_node_get_int(node);
+}
+
+bool flagMember(JsonObject* object, const char* name) {
+  JsonNode* node = valueMember(object, name);
+  return node && json_node_get_value_type(node) == G_TYPE_BOOLEAN && json_node_get_boolean(node);
+}
+
+JsonArray* arrayMember(JsonObject* object, const char* name) {
+  JsonNode* node = json_object_get_member(object, name);
+  return node && JSON_NODE_HOLDS_ARRAY(node) ? json_node_get_array(node) : nullptr;
+}
+
+JsonObject* objectMember(JsonObject* object, const char* name) {
+  JsonNode* node = json_object_get_member(object, name);
+  return node && JSON_NODE_HOLDS_OBJECT(node) ? json_node_get_object(node) : nullptr;
+}
+
+std::string writeJson(JsonNode* root) {
+  const base::OwnedText text(json_to_string(root, FALSE));
+  return text.get();
+}
+
+}  // namespace zelqo

@@ -1,0 +1,37 @@
+/// The database file of the store, which may be replaced while processes have it open.
+#pragma once
+
+#include <sys/types.h>
+
+#include <memory>
+#include <string>
+
+#include "store.h"
+
+namespace zelqo {
+
+class StoreFile {
+ public:
+  explicit StoreFile(std::string path);
+  ~StoreFile();
+  StoreFile(const StoreFile&) = delete;
+  StoreFile& operator=(const StoreFile&) = delete;
+
+  /// Null when it can be neither opened nor begun anew.
+  store::Database* database();
+  /// An operation has failed: a damaged file is moved aside, and the next call begins a new one.
+  void examine();
+
+ private:
+  bool isReplaced() const;
+  bool isDamaged() const;
+  void moveAside();
+  void open();
+
+  std::string _path;
+  std::unique_ptr<store::Database> _database;
+  dev_t _device = 0;
+  ino_t _inode = 0;
+};
+
+}  // namespace zelqo

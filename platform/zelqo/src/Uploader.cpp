@@ -1,0 +1,263 @@
+#include "zelqo/Uploader.h"
+
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <utility>
+
+#include "FileType.h"
+#include "ServiceClient.h"
+#include "zelqo/Account.h"
+#include "zelqo/PhoneSettings.h"
+
+namespace zelqo {
+namespace {
+
+// One file over a slow connection; also longer than the service holds a request.
+constexpr guint kDeadlineMs = 15 * 60 * 1000;
+constexpr guint kAccepted = 202;
+constexpr guint kUnauthorized = 401;
+constexpr std::int64_t kMaxFileSize = 0xffffffff;
+
+using Builder = base::Owned<JsonBuilder, g_object_unref>;
+
+void addText(JsonBuilder* json, const char* member, const std::string& text) {
+  json_builder_set_member_name(json, member);
+  json_builder_add_string_value(json, text.c_str());
+}
+
+void addNumber(JsonBuilder* json, const char* member, std::int64_t number) {
+  json_builder_set_member_name(json, member);
+  json_builder_add_int_value(json, number);
+}
+
+std::string nameOf(const std::string& path) {
+  const base::OwnedText name(g_path_get_basename(path.c_str()));
+  const base::OwnedText valid(g_utf8_make_valid(name.get(), -1));
+  return valid.get();
+}
+
+}  // namespace
+
+Uploader::Uploader(Store& store, const std::string& serviceUrl)
+    : _store(store),
+      _serviceUrl(serviceUrl.empty() ? zelqo::serviceUrl() : serviceUrl),
+      _client(std::make_unique<ServiceClient>(_serviceUrl, kDeadlineMs)) {}
+
+Uploader::~Uploader() {
+  if (_start) g_source_remove(_start);
+}
+
+bool Uploader::start(Request request, ProgressCb progress, DoneCb done) {
+  if (_busy) return false;
+  _busy = true;
+  _request = std::move(request);
+  _progress = std::move(progress);
+  _done = std::move(done);
+  _result = {};
+  _files.clear();
+  _next = 0;
+  _sent = _total = 0;
+  _renewed = false;
+  _account = std::make_unique<Account>(_store, _request.from, _serviceUrl);
+  _start = g_idle_add_full(G_PRIORITY_DEFAULT, beginCb, this, nullptr);
+  return true;
+}
+
+gboolean Uploader::beginCb(void* self) {
+  auto* uploader = static_cast<Uploader*>(self);
+  uploader->_start = 0;
+  uploader->begin();
+  return G_SOURCE_REMOVE;
+}
+
+void Uploader::begin() {
+  if (!checkRequest() || !readFiles()) return;
+  if (_account->signedUp()) {
+    announce();
+  } else {
+    signUp();
+  }
+}
+
+bool Uploader::checkRequest() {
+  if (_request.rawFiles.empty()) return true;
+  const JsonTree raw(json_from_string(_request.rawFiles.c_str(), nullptr));
+  if (raw && JSON_NODE_HOLDS_ARRAY(raw.get())) return true;
+  fail(ZELQO_ERROR_INVALID_PARAMETER, "the raw manifest is no JSON array");
+  return false;
+}
+
+bool Uploader::readFiles() {
+  for (const std::string& path : _request.paths) {
+    struct stat status;
+    const bool usable = stat(path.c_str(), &status) == 0 && S_ISREG(status.st_mode) &&
+                        access(path.c_str(), R_OK) == 0 && status.st_size <= kMaxFileSize;
+    if (!usable) {
+      fail(ZELQO_ERROR_INVALID_PARAMETER, "not a readable file: " + path);
+      return false;
+    }
+    _files.push_back({path, nameOf(path), fileType(path), status.st_size});
+    _total += status.st_size;
+  }
+  return true;
+}
+
+void Uploader::signUp() {
+  _renewed = true;
+  _account->signUp("", [this](int error) {
+    if (error) {
+      fail(error, "cannot sign up " + _request.from);
+    } else {
+      announce();
+    }
+  });
+}
+
+std::string Uploader::announcement() const {
+  const Builder json(json_builder_new());
+  json_builder_begin_object(json.get());
+  addText(json.get(), "from", _request.from);
+  addNumber(json.get(), "expires_in_s", _request.lifetimeS);
+  json_builder_set_member_name(json.get(), "single");
+  json_builder_add_boolean_value(json.get(), _request.single);
+  json_builder_set_member_name(json.get(), "to");
+  json_builder_begin_array(json.get());
+  for (const std::string& number : _request.to) {
+    json_builder_add_string_value(json.get(), number.c_str());
+  }
+  json_builder_end_array(json.get());
+  json_builder_set_member_name(json.get(), "lenient");
+  json_builder_add_boolean_value(json.get(), !_request.rawFiles.empty());
+  json_builder_set_member_name(json.get(), "files");
+  if (!_request.rawFiles.empty()) {
+    json_builder_add_value(json.get(), json_from_string(_request.rawFiles.c_str(), nullptr));
+  } else {
+    json_builder_begin_array(json.get());
+    for (const File& file : _files) {
+      json_builder_begin_object(json.get());
+      addText(json.get(), "name", file.name);
+      addNumber(json.get(), "size", file.size);
+      addText(json.get(), "type", file.type);
+      json_builder_end_object(json.get());
+    }
+    json_builder_end_array(json.get());
+  }
+  json_builder_end_object(json.get());
+  const JsonTree root(json_builder_get_root(json.get()));
+  return writeJson(root.get());
+}
+
+void Uploader::announce() {
+  ServiceClient::Request request;
+  request.method = "POST";
+  request.path = "/v1/shares";
+  request.key = _store.accessKey(_request.from);
+  request.json = announcement();
+  const bool sent = _client->send(request, [this](const ServiceClient::Reply& reply) {
+    if (reply.status == kUnauthorized && !_renewed) {
+      signUp();
+    } else if (reply.error) {
+      fail(reply.error, reply.reason);
+    } else {
+      announced(reply.body);
+    }
+  });
+  if (!sent) fail(ZELQO_ERROR_NETWORK, "no sharing service");
+}
+
+void Uploader::announced(const std::string& body) {
+  const JsonTree json = parseJsonObject(body);
+  JsonObject* object = json ? json_node_get_object(json.get()) : nullptr;
+  const auto token = object ? textMember(object, "token") : std::nullopt;
+  const auto id = object ? numberMember(object, "request_id") : std::nullopt;
+  if (!token || !id) {
+    fail(ZELQO_ERROR_REFUSED, "the service's answer makes no sense");
+    return;
+  }
+  _result.token = *token;
+  _result.requestId = *id;
+  _createdMs = g_get_real_time() / 1000;
+  sendNext();
+}
+
+void Uploader::sendNext() {
+  if (_next == _files.size()) {
+    complete();
+    return;
+  }
+  ServiceClient::Request request;
+  request.method = "PUT";
+  request.path =
+      "/v1/shares/" + std::to_string(_result.requestId) + "/files/" + std::to_string(_next);
+  request.key = _store.accessKey(_request.from);
+  request.file = _files[_next].path;
+  request.sent = [this](goffset bytes) {
+    _sent += bytes;
+    if (_progress) _progress(_sent, _total);
+  };
+  const bool sent = _client->send(request, [this](const ServiceClient::Reply& reply) {
+    if (reply.error) {
+      fail(reply.error, _files[_next].name + ": " + reply.reason);
+      return;
+    }
+    _next++;
+    sendNext();
+  });
+  if (!sent) fail(ZELQO_ERROR_STORE, "cannot read " + _files[_next].path);
+}
+
+void Uploader::complete() {
+  ServiceClient::Request request;
+  request.method = "POST";
+  request.path = "/v1/shares/" + std::to_string(_result.requestId) + "/complete";
+  request.key = _store.accessKey(_request.from);
+  const bool sent = _client->send(request, [this](const ServiceClient::Reply& reply) {
+    if (reply.error) {
+      fail(reply.error, reply.reason);
+    } else if (reply.status == kAccepted) {
+      complete();  // pictures are still being made
+    } else {
+      const JsonTree json = reply.json();
+      JsonObject* object = json ? json_node_get_object(json.get()) : nullptr;
+      if (object) _result.expiresMs = numberMember(object, "expires_ms").value_or(0);
+      keep();
+    }
+  });
+  if (!sent) fail(ZELQO_ERROR_NETWORK, "no sharing service");
+}
+
+void Uploader::keep() {
+  if (_request.from == ownNumber()) {
+    SentShare share;
+    share.requestId = _result.requestId;
+    share.token = _result.token;
+    share.sender = _request.from;
+    share.single = _request.single;
+    share.createdMs = _createdMs;
+    share.expiresMs = _result.expiresMs;
+    share.recipients = _request.to;
+    share.paths = _request.paths;
+    if (!_store.addSent(share)) {
+      fail(ZELQO_ERROR_STORE, "the share was sent, but cannot be recorded");
+      return;
+    }
+  }
+  finish();
+}
+
+void Uploader::fail(int error, const std::string& reason) {
+  _result.error = error;
+  _result.reason = reason;
+  finish();
+}
+
+// Last in whatever calls it: the callback may start the next share or destroy this.
+void Uploader::finish() {
+  _busy = false;
+  const DoneCb done = std::move(_done);
+  const Result result = _result;
+  done(result);
+}
+
+}  // namespace zelqo
