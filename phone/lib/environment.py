@@ -8,7 +8,7 @@ from lib.state import ROOT
 _FOREIGN = ("DBUS_", "XDG_", "WAYLAND_", "LC_", "GTK_", "QT_", "ELM_", "SESSION_MANAGER",
             "DESKTOP_STARTUP_ID", "XAUTHORITY", "LANGUAGE", "INVOCATION_ID", "JOURNAL_STREAM",
             "NOTIFY_SOCKET", "AT_SPI_", "NO_AT_BRIDGE", "PYTHON")
-_QUIET = ("ecore_x:1", "ecore_con:1", "eldbus:1", "efreet_cache:1", "ecore_system_systemd:0",
+_QUIET = ("ecore_x:1", "ecore_con:0", "eldbus:1", "efreet_cache:1", "ecore_system_systemd:0",
           "edje_pick:1", "ethumb_client:1")
 
 

@@ -94,14 +94,15 @@ def run(state, argv, stdin=0, stdout=1, stderr=2, env=None):
     return ask(state, message, (stdin, stdout, stderr))["status"]
 
 
-def output(state, argv, stdin=None):
-    """Runs a program inside the phone; what it printed. A failing program is a failure."""
-    with open(stdin or os.devnull, "rb") as source, _Capture() as out, _Capture() as err:
-        status = run(state, argv, source.fileno(), out.fileno(), err.fileno())
+def output(state, argv, errors=False):
+    """Runs a program inside the phone; what it printed, or, with errors, what it complained of. A
+    failing program is a failure."""
+    with open(os.devnull, "rb") as nothing, _Capture() as out, _Capture() as err:
+        status = run(state, argv, nothing.fileno(), out.fileno(), err.fileno())
         if status != 0:
             lines = err.text().strip().splitlines() or [f"{argv[0]} failed with status {status}"]
             raise Failure(lines[-1])
-        return out.text()
+        return err.text() if errors else out.text()
 
 
 class _Capture:

@@ -14,7 +14,7 @@ COMMANDS = {
     "share": "share",
     "launch": "application", "log": "application", "launches": "application",
     "usage": "application", "prefs": "application",
-    "screenshot": "screen",
+    "tree": "screen", "tap": "screen", "swipe": "screen", "key": "screen", "screenshot": "screen",
     "network": "world", "rotate": "world", "signal": "world", "signals": "world",
     "clock": "world", "language": "world", "account": "world", "service": "world",
     "contact": "world",

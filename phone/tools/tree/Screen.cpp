@@ -1,0 +1,101 @@
+#include "Screen.h"
+
+#include <X11/Xatom.h>
+#include <X11/Xlib.h>
+#include <X11/Xutil.h>
+
+#include <algorithm>
+#include <memory>
+#include <vector>
+
+namespace {
+
+struct CloseDisplay {
+  void operator()(Display* display) const { XCloseDisplay(display); }
+};
+using DisplayOwner = std::unique_ptr<Display, CloseDisplay>;
+
+constexpr long kMostWindows = 1024;
+
+std::vector<unsigned long> numbers(Display* display, Window window, const char* property) {
+  Atom type = None;
+  int format = 0;
+  unsigned long count = 0, rest = 0;
+  unsigned char* data = nullptr;
+  XGetWindowProperty(display, window, XInternAtom(display, property, False), 0, kMostWindows, False,
+                     AnyPropertyType, &type, &format, &count, &rest, &data);
+  std::vector<unsigned long> result;
+  if (format == 32) {
+    const auto* values = reinterpret_cast<unsigned long*>(data);
+    result.assign(values, values + count);
+  }
+  if (data) XFree(data);
+  return result;
+}
+
+std::string text(Display* display, Window window, const char* property) {
+  Atom type = None;
+  int format = 0;
+  unsigned long count = 0, rest = 0;
+  unsigned char* data = nullptr;
+  XGetWindowProperty(display, window, XInternAtom(display, property, False), 0, kMostWindows, False,
+                     AnyPropertyType, &type, &format, &count, &rest, &data);
+  std::string result;
+  if (format == 8) result.assign(reinterpret_cast<char*>(data), count);
+  if (data) XFree(data);
+  return result;
+}
+
+Window viewable(Display* display, const std::vector<unsigned long>& bottomToTop) {
+  for (auto it = bottomToTop.rbegin(); it != bottomToTop.rend(); ++it) {
+    XWindowAttributes attributes{};
+    if (XGetWindowAttributes(display, *it, &attributes) && attributes.map_state == IsViewable) {
+      return *it;
+    }
+  }
+  return None;
+}
+
+int ignoreError(Display*, XErrorEvent*) {
+  return 0;
+}  // a window that has just been closed
+
+}  // namespace
+
+Area AppWindow::onScreen(const Area& canvas) const {
+  const int right = area.x + area.width, bottom = area.y + area.height;
+  switch (rotation) {
+    case 90:
+      return {area.x + canvas.y, bottom - canvas.x - canvas.width, canvas.height, canvas.width};
+    case 180:
+      return {right - canvas.x - canvas.width, bottom - canvas.y - canvas.height, canvas.width,
+              canvas.height};
+    case 270:
+      return {right - canvas.y - canvas.height, area.y + canvas.x, canvas.height, canvas.width};
+    default:
+      return {area.x + canvas.x, area.y + canvas.y, canvas.width, canvas.height};
+  }
+}
+
+std::optional<AppWindow> topWindow() {
+  const DisplayOwner display(XOpenDisplay(nullptr));
+  if (!display) return std::nullopt;
+  XSetErrorHandler(ignoreError);
+  const Window root = DefaultRootWindow(display.get());
+  const Window top =
+      viewable(display.get(), numbers(display.get(), root, "_NET_CLIENT_LIST_STACKING"));
+  if (top == None) return std::nullopt;
+  AppWindow window;
+  window.title = text(display.get(), top, "_NET_WM_NAME");
+  const auto pid = numbers(display.get(), top, "_NET_WM_PID");
+  if (!pid.empty()) window.pid = static_cast<int>(pid[0]);
+  const auto angle = numbers(display.get(), top, "_E_ILLUME_ROTATE_WINDOW_ANGLE");
+  if (!angle.empty()) window.rotation = static_cast<int>(angle[0]);
+  XWindowAttributes attributes{};
+  Window child = None;
+  if (!XGetWindowAttributes(display.get(), top, &attributes)) return std::nullopt;
+  window.area.width = attributes.width;
+  window.area.height = attributes.height;
+  XTranslateCoordinates(display.get(), top, root, 0, 0, &window.area.x, &window.area.y, &child);
+  return window;
+}
