@@ -1,9 +1,6 @@
 #include "MediaRecord.h"
 
-#include <gio/gio.h>
-
-#include <cstring>
-#include <memory>
+#include <base/Owned.h>
 
 #include "ThumbnailQueue.h"
 
@@ -14,11 +11,8 @@ constexpr const char* kAttributes = G_FILE_ATTRIBUTE_STANDARD_TYPE
     "," G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE "," G_FILE_ATTRIBUTE_TIME_MODIFIED
     "," G_FILE_ATTRIBUTE_THUMBNAIL_PATH;
 
-struct Release {
-  void operator()(void* object) const { g_object_unref(object); }
-};
-using OwnedFile = std::unique_ptr<GFile, Release>;
-using OwnedInfo = std::unique_ptr<GFileInfo, Release>;
+using OwnedFile = base::Owned<GFile, g_object_unref>;
+using OwnedInfo = base::Owned<GFileInfo, g_object_unref>;
 
 OwnedInfo query(const std::string& path, const char* attributes) {
   const OwnedFile file(g_file_new_for_path(path.c_str()));
@@ -42,8 +36,7 @@ std::string currentThumbnail(GFileInfo* info) {
 std::string mimeTypeOf(GFileInfo* info) {
   const char* type =
       g_file_info_get_attribute_string(info, G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE);
-  const std::unique_ptr<char, void (*)(void*)> mimeType(
-      type ? g_content_type_get_mime_type(type) : nullptr, g_free);
+  const base::OwnedText mimeType(type ? g_content_type_get_mime_type(type) : nullptr);
   return mimeType ? mimeType.get() : "application/octet-stream";
 }
 

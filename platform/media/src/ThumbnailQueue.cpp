@@ -1,14 +1,15 @@
 #include "ThumbnailQueue.h"
 
-#include <gio/gio.h>
+#include <base/Bus.h>
 
-#include <memory>
 #include <unordered_set>
 #include <vector>
 
 namespace media {
 namespace {
 
+constexpr const char* kService = "org.freedesktop.thumbnails.Thumbnailer1";
+constexpr const char* kPath = "/org/freedesktop/thumbnails/Thumbnailer1";
 constexpr int kTimeoutMs = 10000;
 
 struct Request {
@@ -22,8 +23,7 @@ class ThumbnailQueue {
     // A file without a picture leaves no trace in the cache: without this memory every look at it
     // would ask again.
     if (!_asked.insert(path).second) return;
-    const std::unique_ptr<char, void (*)(void*)> uri(
-        g_filename_to_uri(path.c_str(), nullptr, nullptr), g_free);
+    const base::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
     if (!uri) return;
     if (_pending.empty()) g_idle_add(_sendCb, this);
     _pending.push_back({uri.get(), mimeType});
@@ -45,16 +45,12 @@ class ThumbnailQueue {
       g_variant_builder_add(&types, "s", request.mimeType.c_str());
     }
     _pending.clear();
-    GVariant* arguments =
-        g_variant_ref_sink(g_variant_new("(asasssu)", &uris, &types, "large", "foreground", 0u));
-    if (GDBusConnection* bus = g_bus_get_sync(G_BUS_TYPE_SESSION, nullptr, nullptr)) {
-      g_dbus_connection_call(bus, "org.freedesktop.thumbnails.Thumbnailer1",
-                             "/org/freedesktop/thumbnails/Thumbnailer1",
-                             "org.freedesktop.thumbnails.Thumbnailer1", "Queue", arguments, nullptr,
-                             G_DBUS_CALL_FLAGS_NONE, kTimeoutMs, nullptr, nullptr, nullptr);
-      g_object_unref(bus);
-    }
-    g_variant_unref(arguments);
+    const base::OwnedVariant arguments(
+        g_variant_ref_sink(g_variant_new("(asasssu)", &uris, &types, "large", "foreground", 0u)));
+    const base::OwnedBus bus = base::sessionBus();
+    if (!bus) return;
+    g_dbus_connection_call(bus.get(), kService, kPath, kService, "Queue", arguments.get(), nullptr,
+                           G_DBUS_CALL_FLAGS_NONE, kTimeoutMs, nullptr, nullptr, nullptr);
   }
 
   std::unordered_set<std::string> _asked;

@@ -1,3 +1,4 @@
+#include <base/PhonePaths.h>
 #include <media_content.h>
 
 #include <cstring>
@@ -19,8 +20,6 @@ struct media_info_s {
 };
 
 namespace {
-
-constexpr const char* kMediaFolder = "/opt/usr/media";
 
 int connections = 0;
 
@@ -64,7 +63,7 @@ bool report(const std::string& path, media_info_cb callback, void* userData) {
 
 void reportAll(media_info_cb callback, void* userData) {
   std::error_code error;
-  fs::recursive_directory_iterator entry(kMediaFolder, error);
+  fs::recursive_directory_iterator entry(base::phoneRoot() + "/media", error);
   for (; entry != fs::recursive_directory_iterator(); entry.increment(error)) {
     const bool hidden = entry->path().filename().native()[0] == '.';
     if (hidden) {

@@ -12,10 +12,7 @@ namespace {
 
 constexpr std::size_t kSniffBytes = 4096;
 
-struct FreeText {
-  void operator()(char* text) const { g_free(text); }
-};
-using OwnedText = std::unique_ptr<char, FreeText>;
+using base::OwnedText;
 
 class File {
  public:
@@ -81,6 +78,12 @@ OwnedText typeOf(const std::string& path, const std::string& bytes) {
   return isA(named.get(), content.get()) ? std::move(named) : std::move(content);
 }
 
+// A phone has no terminal to run the others in.
+bool hasWindow(GAppInfo* info) {
+  return !G_IS_DESKTOP_APP_INFO(info) ||
+         !g_desktop_app_info_get_boolean(G_DESKTOP_APP_INFO(info), "Terminal");
+}
+
 }  // namespace
 
 std::string openableType(const std::string& path) {
@@ -97,7 +100,16 @@ std::string openableType(const std::string& path) {
 OwnedAppInfo handlerFor(const std::string& path) {
   const std::string type = openableType(path);
   if (type.empty()) return nullptr;
-  return OwnedAppInfo(g_app_info_get_default_for_type(type.c_str(), FALSE));
+  OwnedAppInfo preferred(g_app_info_get_default_for_type(type.c_str(), FALSE));
+  if (preferred && hasWindow(preferred.get())) return preferred;
+  GList* all = g_app_info_get_all_for_type(type.c_str());
+  OwnedAppInfo found;
+  for (GList* entry = all; entry && !found; entry = entry->next) {
+    auto* info = static_cast<GAppInfo*>(entry->data);
+    if (hasWindow(info)) found.reset(G_APP_INFO(g_object_ref(info)));
+  }
+  g_list_free_full(all, g_object_unref);
+  return found;
 }
 
 bool resolver_can_open(const char* path) {

@@ -1,16 +1,12 @@
-#include <gio/gio.h>
+#include <base/Owned.h>
 #include <mime_type.h>
 
 #include <cstring>
-#include <memory>
 #include <string>
 
 namespace {
 
-struct FreeText {
-  void operator()(char* text) const { g_free(text); }
-};
-using OwnedText = std::unique_ptr<char, FreeText>;
+using base::OwnedText;
 
 // Where the shared database means something else by the extension than a phone does.
 struct Override {

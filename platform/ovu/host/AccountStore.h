@@ -14,9 +14,9 @@ struct Account {
 
 class AccountStore {
  public:
-  static constexpr const char* kPath = "/opt/usr/dbspace/account.db";
-
-  explicit AccountStore(const std::string& path = kPath);
+  /// The phone's own.
+  AccountStore();
+  explicit AccountStore(const std::string& path);
   ~AccountStore();
   AccountStore(const AccountStore&) = delete;
   AccountStore& operator=(const AccountStore&) = delete;

@@ -1,5 +1,6 @@
 #include "AccountStore.h"
 
+#include <base/PhonePaths.h>
 #include <ovu.h>
 
 #include "SimCard.h"
@@ -35,6 +36,8 @@ void report(bool* failed) {
 struct AccountStore::Private {
   std::unique_ptr<store::Database> database;
 };
+
+AccountStore::AccountStore() : AccountStore(base::databaseFolder() + "/account.db") {}
 
 AccountStore::AccountStore(const std::string& path) : _d(new Private) {
   _d->database = store::Database::open(path, kSchema);

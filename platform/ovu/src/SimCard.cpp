@@ -1,8 +1,6 @@
 #include "SimCard.h"
 
-#include <gio/gio.h>
-
-#include <memory>
+#include <base/Bus.h>
 
 namespace ovu {
 namespace {
@@ -12,12 +10,7 @@ constexpr const char* kModem = "org.freedesktop.ModemManager1.Modem";
 constexpr const char* kSim = "org.freedesktop.ModemManager1.Sim";
 constexpr int kTimeoutMs = 1000;
 
-struct Release {
-  void operator()(GDBusConnection* bus) const { g_object_unref(bus); }
-  void operator()(GVariant* value) const { g_variant_unref(value); }
-};
-using OwnedBus = std::unique_ptr<GDBusConnection, Release>;
-using OwnedVariant = std::unique_ptr<GVariant, Release>;
+using base::OwnedVariant;
 
 OwnedVariant call(GDBusConnection* bus, const char* path, const char* interface, const char* method,
                   GVariant* arguments, const char* replyType) {
@@ -45,7 +38,7 @@ std::string firstSimPath(GVariant* objects) {
 }  // namespace
 
 std::string simCardImsi() {
-  const OwnedBus bus(g_bus_get_sync(G_BUS_TYPE_SYSTEM, nullptr, nullptr));
+  const base::OwnedBus bus = base::systemBus();
   if (!bus) return {};
   const auto managed =
       call(bus.get(), "/org/freedesktop/ModemManager1", "org.freedesktop.DBus.ObjectManager",

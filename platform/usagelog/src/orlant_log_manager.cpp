@@ -1,3 +1,4 @@
+#include <base/PhonePaths.h>
 #include <glib.h>
 #include <orlant_log_manager.h>
 
@@ -7,7 +8,6 @@
 
 namespace {
 
-constexpr const char* kPath = "/opt/usr/dbspace/usagelog.db";
 constexpr const char* kSchema =
     "CREATE TABLE IF NOT EXISTS record(id INTEGER PRIMARY KEY AUTOINCREMENT, "
     "time INTEGER NOT NULL, uri TEXT NOT NULL, app_id TEXT, feature TEXT, extra TEXT)";
@@ -58,7 +58,7 @@ struct orlant_log_manager_s {
 int orlant_log_manager_create(orlant_log_manager_h* handle) {
   if (!handle) return ORLANT_LOG_ERROR_INVALID_PARAMETER;
   *handle = nullptr;
-  auto database = store::Database::open(kPath, kSchema);
+  auto database = store::Database::open(base::databaseFolder() + "/usagelog.db", kSchema);
   if (!database) return ORLANT_LOG_ERROR_STORE;
   *handle = new orlant_log_manager_s{std::move(database)};
   return ORLANT_LOG_ERROR_NONE;
