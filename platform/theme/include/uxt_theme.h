@@ -1,4 +1,4 @@
-/// Changeable tables of theme colours and fonts.
+/// An application's own tables of colours and fonts.
 #pragma once
 
 #include <stdbool.h>
@@ -10,19 +10,18 @@ extern "C" {
 typedef struct uxt_theme_color_table_s* uxt_theme_color_table_h;
 typedef struct uxt_theme_font_table_s* uxt_theme_font_table_h;
 
-/// Whether the colours follow the phone's choice of light or dark.
+/// Whether the tables follow the phone's light and dark theme; otherwise they stay light.
 void uxt_theme_set_changeable_ui_enabled(bool enabled);
 
-/// Read a table; null when it cannot be read. The caller deletes it.
+/// Reads a table; null, with a log line, when it cannot be read. The caller deletes it.
 uxt_theme_color_table_h uxt_theme_add_color_table(const char* path);
 uxt_theme_font_table_h uxt_theme_add_font_table(const char* path);
 
-/// Make the table's codes current. The table has to live until it is replaced or deleted.
-/// 0, or -22 for null.
+/// Makes the table's codes current: 0, or -22 for null.
 int uxt_theme_set_color_table(uxt_theme_color_table_h table);
 int uxt_theme_set_font_table(uxt_theme_font_table_h table);
 
-/// Null is allowed. The codes of a current table are forgotten.
+/// Null is allowed. The codes of a deleted table stay as they are.
 void uxt_theme_delete_color_table(uxt_theme_color_table_h table);
 void uxt_theme_delete_font_table(uxt_theme_font_table_h table);
 

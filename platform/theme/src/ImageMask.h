@@ -1,20 +1,31 @@
+/// Cutting a picture out by a mask: arithmetic on pixels, nothing else.
 #pragma once
 
-#include <stdint.h>
+#include <cstddef>
+#include <cstdint>
 
-#include <vector>
+namespace theme {
 
-/// Pixels in rows from the top, straight alpha, bytes red, green, blue, alpha.
-struct Pixels {
-  int width = 0;
-  int height = 0;
-  std::vector<uint8_t> rgba;
+struct Size {
+  int width;
+  int height;
 };
 
-/// What of the image is seen through the mask's alpha laid at (x, y), premultiplied 32-bit ARGB.
-/// Outside of the mask nothing is seen. The result has the image's size.
-std::vector<uint32_t> maskPixels(const Pixels& image, const Pixels& mask, int x, int y);
+/// Eight bits a channel, rows `stride` bytes apart, three channels or four with opacity last.
+struct Pixels {
+  const uint8_t* data;
+  Size size;
+  size_t stride;
+  int channels;
 
-/// The same for files: the image fills w x h, the mask keeps its own size. A malloc block, null
-/// when a file cannot be read or is unreasonably large.
-uint32_t* maskImage(const char* image, const char* mask, int w, int h, int x, int y);
+  const uint8_t* at(int x, int y) const {
+    return data + static_cast<size_t>(y) * stride + static_cast<size_t>(x) * channels;
+  }
+  uint8_t opacity(int x, int y) const { return channels == 4 ? at(x, y)[3] : 255; }
+};
+
+/// Writes premultiplied ARGB, as many pixels as the picture has: its own opacity times that of the
+/// mask, whose upper left corner lies at (maskX, maskY). Nothing is seen beside the mask.
+void maskPixels(const Pixels& picture, const Pixels& mask, int maskX, int maskY, uint32_t* result);
+
+}  // namespace theme

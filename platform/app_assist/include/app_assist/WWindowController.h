@@ -26,6 +26,8 @@ class WWindowController {
 
  private:
   friend class WApp;
+  friend class WContentViewController;
+  friend class WPopupController;
   struct Private;
   std::unique_ptr<Private> _d;
 };

@@ -1,0 +1,88 @@
+#include "DeviceTheme.h"
+
+#include <Ecore_X.h>
+#include <Elementary.h>
+#include <dlog.h>
+#include <vconf.h>
+
+#include <base/Owned.h>
+#include <base/PhonePaths.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+
+#include "SettingKeys.h"
+
+namespace app_assist {
+namespace {
+
+constexpr double kDesignScale = 2.6;
+constexpr double kDesignWidth = 720;
+/// Titles keep their size, or they would not fit.
+constexpr const char* kScaledTexts[] = {"caption", "body", "label"};
+
+using OwnedData = base::Owned<char, free>;
+
+std::string themeData(const std::string& key) {
+  const OwnedData value(edje_file_data_get(DeviceTheme::path().c_str(), key.c_str()));
+  return value ? value.get() : "";
+}
+
+void setColour(const char* name, const char* palette) {
+  const std::string value = themeData(std::string(palette) + "/" + name);
+  int r = 0, g = 0, b = 0, a = 0;
+  if (sscanf(value.c_str(), "%d %d %d %d", &r, &g, &b, &a) != 4) {
+    dlog_print(DLOG_ERROR, "APP_ASSIST", "palette %s has no colour %s", palette, name);
+    return;
+  }
+  edje_color_class_set(name, r, g, b, a, 0, 0, 0, 0, 0, 0, 0, 0);
+}
+
+}  // namespace
+
+std::string DeviceTheme::path() {
+  const char* given = getenv("APP_ASSIST_THEME");
+  return given && *given ? given : base::phoneRoot() + "/share/theme/device.edj";
+}
+
+bool DeviceTheme::install() {
+  const std::string file = path();
+  if (!edje_file_group_exists(file.c_str(), "elm/layout/phone/window")) {
+    dlog_print(DLOG_ERROR, "APP_ASSIST", "no device theme in %s", file.c_str());
+    return false;
+  }
+  elm_theme_overlay_add(nullptr, file.c_str());
+  applyScale();
+  applyPalette();
+  applyTextSize();
+  return true;
+}
+
+void DeviceTheme::applyPalette() {
+  const base::Owned<char, free> wanted(vconf_get_str(kThemeKey));
+  const char* palette = wanted && strcmp(wanted.get(), "dark") == 0 ? "dark" : "light";
+  const std::string names = themeData("colours");
+  const base::OwnedTexts list(g_strsplit(names.c_str(), " ", -1));
+  for (char** name = list.get(); *name; name++) {
+    if (**name) setColour(*name, palette);
+  }
+}
+
+void DeviceTheme::applyTextSize() {
+  int percent = 100;
+  vconf_get_int(kTextSizeKey, &percent);
+  percent = std::clamp(percent, 80, 200);
+  for (const char* name : kScaledTexts) edje_text_class_set(name, nullptr, -percent);
+}
+
+void DeviceTheme::applyScale() {
+  int count = 0;
+  const base::Owned<Ecore_X_Window, free> roots(ecore_x_window_root_list(&count));
+  int width = 0, height = 0;
+  if (count > 0) ecore_x_window_size_get(roots.get()[0], &width, &height);
+  elm_config_scale_set(width > 0 ? kDesignScale * width / kDesignWidth : kDesignScale);
+}
+
+}  // namespace app_assist

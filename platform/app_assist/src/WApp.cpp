@@ -1,0 +1,171 @@
+#include "app_assist/WApp.h"
+
+#include <Ecore_X.h>
+#include <Elementary.h>
+#include <appfw/AppId.h>
+#include <appfw/AppService.h>
+#include <dlog.h>
+#include <vconf.h>
+
+#include <cstdlib>
+
+#include "DeviceTheme.h"
+#include "GlibBridge.h"
+#include "Language.h"
+#include "LateDestroyer.h"
+#include "SettingKeys.h"
+#include "WindowPrivate.h"
+#include "app_assist/WNaviframeController.h"
+
+namespace app_assist {
+namespace {
+
+WApp* theApp = nullptr;
+
+}  // namespace
+
+struct WApp::Private {
+  explicit Private(WApp* self) : self(self) {}
+
+  WApp* const self;
+  std::unique_ptr<appfw::AppService> service;
+  std::unique_ptr<WWindowController> window;
+  Ecore_Event_Handler* visibility = nullptr;
+  bool paused = false;
+
+  bool takeName();
+  void setUpToolkit();
+  int run();
+  void tearDown();
+  void followSettings(bool follow);
+
+  static Eina_Bool visibilityCb(void* data, int, void* event);
+  static void languageCb(keynode_t*, void*) { Language::apply(); }
+  static void paletteCb(keynode_t*, void*) { DeviceTheme::applyPalette(); }
+  static void textSizeCb(keynode_t*, void*) { DeviceTheme::applyTextSize(); }
+};
+
+WApp::WApp(int, char**) : _d(std::make_unique<Private>(this)) {}
+
+WApp::~WApp() {
+  if (theApp == this) theApp = nullptr;
+}
+
+bool WApp::onStart() {
+  return true;
+}
+
+bool WApp::onCreate() {
+  return true;
+}
+
+void WApp::onTerminate() {}
+
+void WApp::onPause() {}
+
+void WApp::onResume() {}
+
+void WApp::onAppControl(app_control_h) {}
+
+/// The name comes first: whoever launches the application waits for it, and requests queue up.
+int WApp::start(int argc, char** argv) {
+  theApp = this;
+  if (!_d->takeName()) return EXIT_FAILURE;
+  if (!elm_init(argc, argv)) return EXIT_FAILURE;
+  _d->setUpToolkit();
+  const int status = onStart() ? _d->run() : EXIT_FAILURE;
+  _d->service.reset();
+  elm_shutdown();
+  theApp = nullptr;
+  return status;
+}
+
+void WApp::attachWindowController(WWindowController* window) {
+  _d->window.reset(window);
+  if (window) window->_d->open();
+}
+
+WWindowController* WApp::getWindowController() const {
+  return _d->window.get();
+}
+
+WApp* WApp::getInstance() {
+  return theApp;
+}
+
+/// A process that is no installed application gets no requests, but runs.
+bool WApp::Private::takeName() {
+  const std::string& id = appfw::applicationId();
+  if (id.empty()) {
+    dlog_print(DLOG_WARN, "APP_ASSIST", "no application id: nobody can launch this");
+    return true;
+  }
+  service = std::make_unique<appfw::AppService>(id);
+  return service->start([] { elm_exit(); });
+}
+
+/// The language follows its setting before anybody else hears of a change, so the framework
+/// listens first.
+void WApp::Private::setUpToolkit() {
+  installGlibBridge();
+  followSettings(true);
+  Language::bindCatalogues();
+  Language::apply();
+  DeviceTheme::install();
+  visibility = ecore_event_handler_add(ECORE_X_EVENT_WINDOW_VISIBILITY_CHANGE, visibilityCb, this);
+}
+
+int WApp::Private::run() {
+  if (self->onCreate()) {
+    if (service) service->deliverTo([this](app_control_h request) { self->onAppControl(request); });
+    elm_run();
+  }
+  tearDown();
+  return EXIT_SUCCESS;
+}
+
+/// Views end while everything they use is there; the window that they looked at goes last.
+void WApp::Private::tearDown() {
+  ecore_event_handler_del(visibility);
+  WViewController* base = window ? window->getBaseViewController() : nullptr;
+  if (auto* naviframe = dynamic_cast<WNaviframeController*>(base))
+    naviframe->destroyAllViewControllers();
+  LateDestroyer::instance().flush();
+  self->onTerminate();
+  window.reset();
+  LateDestroyer::instance().flush();
+  followSettings(false);
+}
+
+void WApp::Private::followSettings(bool follow) {
+  static const struct {
+    const char* key;
+    vconf_callback_fn callback;
+  } kFollowed[] = {
+      {VCONFKEY_LANGSET, languageCb}, {kThemeKey, paletteCb}, {kTextSizeKey, textSizeCb}};
+  for (const auto& entry : kFollowed) {
+    if (follow) {
+      vconf_notify_key_changed(entry.key, entry.callback, nullptr);
+    } else {
+      vconf_ignore_key_changed(entry.key, entry.callback);
+    }
+  }
+}
+
+Eina_Bool WApp::Private::visibilityCb(void* data, int, void* event) {
+  auto* self = static_cast<Private*>(data);
+  const auto* change = static_cast<Ecore_X_Event_Window_Visibility_Change*>(event);
+  Evas_Object* window = self->window ? self->window->getEvasObj() : nullptr;
+  if (!window || change->win != elm_win_xwindow_get(window)) return ECORE_CALLBACK_PASS_ON;
+  const bool hidden = change->fully_obscured;
+  if (hidden == self->paused) return ECORE_CALLBACK_PASS_ON;
+  self->paused = hidden;
+  if (hidden) {
+    self->self->onPause();
+  } else {
+    self->self->onResume();
+  }
+  return ECORE_CALLBACK_PASS_ON;
+}
+
+}  // namespace app_assist
