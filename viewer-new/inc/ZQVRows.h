@@ -25,5 +25,5 @@ Row* zqvRowOf(void* data) {
   return static_cast<Row*>(static_cast<app_assist::WGenlistItem*>(data));
 }
 
-/// Keeps all rows of a list realised, where the toolkit can.
+/// Keeps all rows of a list realised.
 void zqvRealizeAllRows(Evas_Object* list);

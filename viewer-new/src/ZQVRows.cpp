@@ -7,8 +7,8 @@
 #include "ZQVText.h"
 
 extern "C" {
-/// The device's toolkit has this; the one of a desktop realises all rows in sight anyway.
-void elm_genlist_realization_mode_set(Evas_Object* list, Eina_Bool mode) __attribute__((weak));
+/// Only the headers of the device's toolkit declare this.
+void elm_genlist_realization_mode_set(Evas_Object* list, Eina_Bool mode);
 }
 
 Elm_Genlist_Item_Class zqvRowClass(const char* style, Elm_Gen_Item_Text_Get_Cb text,
@@ -45,5 +45,5 @@ Elm_Object_Item* zqvAppendRow(Evas_Object* list, app_assist::WGenlistItem* row,
 }
 
 void zqvRealizeAllRows(Evas_Object* list) {
-  if (elm_genlist_realization_mode_set) elm_genlist_realization_mode_set(list, EINA_TRUE);
+  elm_genlist_realization_mode_set(list, EINA_TRUE);
 }
