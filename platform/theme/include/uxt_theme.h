@@ -21,7 +21,7 @@ uxt_theme_font_table_h uxt_theme_add_font_table(const char* path);
 int uxt_theme_set_color_table(uxt_theme_color_table_h table);
 int uxt_theme_set_font_table(uxt_theme_font_table_h table);
 
-/// Null is allowed. The codes of a deleted table stay as they are.
+/// Null is allowed. The codes of a table in force are unknown from then on.
 void uxt_theme_delete_color_table(uxt_theme_color_table_h table);
 void uxt_theme_delete_font_table(uxt_theme_font_table_h table);
 

@@ -49,23 +49,31 @@ void Appearance::setChangeable(bool changeable) {
 }
 
 void Appearance::setColours(const ColourTable* table) {
+  forget(_colours);
   _colours = table;
   follow();
   applyColours();
 }
 
 void Appearance::setFonts(const FontTable* table) {
+  forget(_fonts);
   _fonts = table;
   follow();
   applyFonts();
 }
 
 void Appearance::forget(const ColourTable* table) {
-  if (_colours == table) _colours = nullptr;
+  if (!table || _colours != table) return;
+  _colours = nullptr;
+  for (const Style style : {Style::Light, Style::Dark}) {
+    for (const auto& entry : table->colours(style)) edje_color_class_del(entry.first.c_str());
+  }
 }
 
 void Appearance::forget(const FontTable* table) {
-  if (_fonts == table) _fonts = nullptr;
+  if (!table || _fonts != table) return;
+  _fonts = nullptr;
+  for (const auto& entry : table->fonts()) edje_text_class_del(entry.first.c_str());
 }
 
 bool Appearance::colourObject(Evas_Object* object, const std::string& code) {

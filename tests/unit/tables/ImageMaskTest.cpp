@@ -3,43 +3,60 @@
 #include <efl_assist.h>
 #include <gtest/gtest.h>
 
+#include <vector>
+
 namespace {
 
-Pixels plain(int width, int height, std::vector<uint8_t> pixel) {
-  Pixels pixels{width, height, {}};
-  for (int i = 0; i < width * height; ++i) {
-    pixels.rgba.insert(pixels.rgba.end(), pixel.begin(), pixel.end());
+struct Plain {
+  Plain(int width, int height, std::vector<uint8_t> pixel) : width(width), height(height) {
+    for (int i = 0; i < width * height; ++i) bytes.insert(bytes.end(), pixel.begin(), pixel.end());
+    channels = static_cast<int>(pixel.size());
   }
-  return pixels;
+  theme::Pixels pixels() const {
+    return {bytes.data(), {width, height}, static_cast<size_t>(width) * channels, channels};
+  }
+
+  int width;
+  int height;
+  int channels;
+  std::vector<uint8_t> bytes;
+};
+
+std::vector<uint32_t> masked(const Plain& picture, const Plain& mask, int x, int y) {
+  std::vector<uint32_t> result(static_cast<size_t>(picture.width) * picture.height);
+  theme::maskPixels(picture.pixels(), mask.pixels(), x, y, result.data());
+  return result;
 }
 
 }  // namespace
 
 TEST(ImageMask, KeepsWhatAnOpaqueMaskCovers) {
-  const auto result = maskPixels(plain(2, 1, {10, 20, 30, 255}), plain(2, 1, {0, 0, 0, 255}), 0, 0);
+  const auto result = masked(Plain(2, 1, {10, 20, 30, 255}), Plain(2, 1, {0, 0, 0, 255}), 0, 0);
   EXPECT_EQ(result, (std::vector<uint32_t>{0xff0a141e, 0xff0a141e}));
 }
 
 TEST(ImageMask, HidesWhatATransparentMaskCovers) {
-  const auto result = maskPixels(plain(1, 1, {10, 20, 30, 255}), plain(1, 1, {9, 9, 9, 0}), 0, 0);
+  const auto result = masked(Plain(1, 1, {10, 20, 30, 255}), Plain(1, 1, {9, 9, 9, 0}), 0, 0);
   EXPECT_EQ(result, (std::vector<uint32_t>{0}));
 }
 
 TEST(ImageMask, PremultipliesColoursWithImageAndMaskAlpha) {
-  const auto result =
-      maskPixels(plain(1, 1, {255, 128, 0, 128}), plain(1, 1, {0, 0, 0, 128}), 0, 0);
+  const auto result = masked(Plain(1, 1, {255, 128, 0, 128}), Plain(1, 1, {0, 0, 0, 128}), 0, 0);
   EXPECT_EQ(result, (std::vector<uint32_t>{0x40402000}));
 }
 
 TEST(ImageMask, ShowsNothingBesideTheMask) {
-  const auto result =
-      maskPixels(plain(3, 1, {255, 255, 255, 255}), plain(1, 1, {0, 0, 0, 255}), 1, 0);
+  const auto result = masked(Plain(3, 1, {255, 255, 255, 255}), Plain(1, 1, {0, 0, 0, 255}), 1, 0);
   EXPECT_EQ(result, (std::vector<uint32_t>{0, 0xffffffff, 0}));
 }
 
-TEST(ImageMask, TakesOffsetsFarOutside) {
-  const auto image = plain(1, 1, {1, 1, 1, 255});
-  EXPECT_EQ(maskPixels(image, image, 2000000000, -2000000000), (std::vector<uint32_t>{0}));
+TEST(ImageMask, TakesAPictureWithoutOpacityAsOpaque) {
+  const auto result = masked(Plain(1, 1, {255, 0, 255}), Plain(1, 1, {0, 0, 0, 255}), 0, 0);
+  EXPECT_EQ(result, (std::vector<uint32_t>{0xffff00ff}));
+}
+
+TEST(ImageMask, RefusesOffsetsFarOutside) {
+  EXPECT_EQ(ea_image_effect_mask("/a.png", "/a.png", 74, 74, 2000000000, -2000000000), nullptr);
 }
 
 TEST(ImageMask, IsNullForFilesThatAreNoPictures) {
