@@ -16,3 +16,18 @@ function(companion_application target id)
     endif()
   endif()
 endfunction()
+
+# companion_icons(ID FILE.svg...): drawn as PNG of the size of a row's picture.
+function(companion_icons id)
+  set(icons)
+  foreach(source IN LISTS ARGN)
+    get_filename_component(name ${source} NAME_WE)
+    set(icon ${PHONE_IMAGE}/apps/${id}/res/images/${name}.png)
+    add_custom_command(OUTPUT ${icon} DEPENDS ${source} VERBATIM
+      COMMAND ${CMAKE_COMMAND} -E make_directory ${PHONE_IMAGE}/apps/${id}/res/images
+      COMMAND ${RSVG_CONVERT} -w 84 -h 84 -o ${icon}.new ${CMAKE_CURRENT_SOURCE_DIR}/${source}
+      COMMAND ${CMAKE_COMMAND} -E rename ${icon}.new ${icon})
+    list(APPEND icons ${icon})
+  endforeach()
+  add_custom_target(icons_${id} ALL DEPENDS ${icons})
+endfunction()

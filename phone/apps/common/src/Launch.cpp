@@ -83,6 +83,26 @@ void reply(app_control_h request, app_control_result_e result, const std::string
   app_control_reply_to_launch_request(raw, request, result);
 }
 
+PendingReply::PendingReply(app_control_h request) {
+  app_control_h copy = nullptr;
+  if (app_control_clone(&copy, request) == APP_CONTROL_ERROR_NONE) _request.reset(copy);
+}
+
+PendingReply& PendingReply::operator=(PendingReply&& other) {
+  send(APP_CONTROL_RESULT_CANCELED);
+  _request = std::move(other._request);
+  return *this;
+}
+
+PendingReply::~PendingReply() {
+  send(APP_CONTROL_RESULT_CANCELED);
+}
+
+void PendingReply::send(app_control_result_e result, const std::string& message) {
+  const OwnedRequest request = std::move(_request);
+  if (request) reply(request.get(), result, message);
+}
+
 // The viewer reads a request id whenever it is told the kind of share.
 void openReceivedShare(const std::string& token, bool single) {
   openShare("received", token.c_str(), "0", single);

@@ -21,6 +21,22 @@ std::vector<std::string> extrasOf(app_control_h request, const char* key);
 /// Tells the sender how its request ended.
 void reply(app_control_h request, app_control_result_e result, const std::string& message = {});
 
+/// A request that is answered later, from the user's doing; cancelled when nothing else came.
+class PendingReply {
+ public:
+  PendingReply() = default;
+  explicit PendingReply(app_control_h request);
+  PendingReply(PendingReply&& other) = default;
+  PendingReply& operator=(PendingReply&& other);
+  ~PendingReply();
+
+  /// The first answer counts.
+  void send(app_control_result_e result, const std::string& message = {});
+
+ private:
+  OwnedRequest _request;
+};
+
 /// The viewer on a share; a message in the status bar when it cannot be started.
 void openReceivedShare(const std::string& token, bool single);
 void openSentShare(int requestId, bool single);
