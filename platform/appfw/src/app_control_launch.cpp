@@ -7,6 +7,7 @@
 #include <appfw/Launch.h>
 #include <base/Bus.h>
 #include <dlog.h>
+#include <mime_handler.h>
 
 #include <memory>
 
@@ -21,7 +22,7 @@ std::string targetOf(const bundle& request) {
   const std::string appId = textOf(request, kKeyAppId);
   if (!appId.empty()) return appId;
   const bool findable = textOf(request, kKeyOperation) == APP_CONTROL_OPERATION_VIEW &&
-                        !textOf(request, kKeyUri).empty();
+                        mime::resolver_can_open(textOf(request, kKeyUri).c_str());
   return findable ? kResolver : std::string();
 }
 

@@ -18,7 +18,11 @@ std::string openableType(const std::string& path);
 /// The program for openableType(path), or null.
 OwnedAppInfo handlerFor(const std::string& path);
 
-/// Whether handlerFor(path) finds a program.
-bool resolver_can_open(const char* path);
+/// The path that a launch request's URI means: one of the form file://, or the path itself. Empty
+/// for anything else.
+std::string pathOfUri(const std::string& uri);
+
+/// Whether some program of the phone opens what the URI means.
+bool resolver_can_open(const char* uri);
 
 }  // namespace mime
