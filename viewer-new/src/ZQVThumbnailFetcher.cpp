@@ -4,7 +4,6 @@
 #include <Elementary.h>
 #include <app_preference.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
@@ -278,7 +277,7 @@ bool ZQVThumbnailFetcher::_checkAndCreateFolder(const char* path) {
     ZQV_ERROR("create %s failed. errno: %s", path, strerror(errno));
     return false;
   }
-  if (access(path, W_OK) != 0 && chmod(path, 0777) != 0) {
+  if (!ecore_file_can_write(path) && chmod(path, 0777) != 0) {
     ZQV_ERROR("chmod %s failed. errno: %s", path, strerror(errno));
     return false;
   }
