@@ -51,6 +51,17 @@ int wholePart(float value) {
 using PatternGenerator = ZQVOwned<UDateTimePatternGenerator, udatpg_close>;
 using DateFormat = ZQVOwned<UDateFormat, udat_close>;
 
+/// ICU crashes on a name that is too long for a locale; null is its default locale.
+bool isLocale(const char* name) {
+  if (!name) return true;
+  UErrorCode status = U_ZERO_ERROR;
+  char language[ULOC_LANG_CAPACITY] = {};
+  uloc_getLanguage(name, language, sizeof language, &status);
+  char full[ULOC_FULLNAME_CAPACITY] = {};
+  uloc_getName(name, full, sizeof full, &status);
+  return U_SUCCESS(status) && status != U_STRING_NOT_TERMINATED_WARNING;
+}
+
 /// The best pattern of a locale for a skeleton; its length, 0 for none.
 int32_t bestPattern(const char* locale, const UChar* skeleton, UChar* pattern, int32_t capacity) {
   UErrorCode status = U_ZERO_ERROR;
@@ -183,13 +194,15 @@ char* ZQViewerCommon::zquiCommonConvertFileSizeUnit(uint64_t size, float* value)
 char* ZQViewerCommon::getDateString(const char* locale, const UChar* skeleton, double time) {
   if (time == 0.0) return nullptr;
   UErrorCode status = U_ZERO_ERROR;
-  uloc_setDefault(getenv("LC_TIME"), &status);
+  const char* environment = getenv("LC_TIME");
+  if (isLocale(environment)) uloc_setDefault(environment, &status);
   char name[kTextBuffer] = {};
   if (locale) g_strlcpy(name, locale, sizeof name);
   if (char* codeset = strstr(name, ".UTF-8")) *codeset = '\0';
   const char* where = locale ? name : nullptr;
   UChar pattern[255] = {};
-  const int32_t length = bestPattern(where, skeleton, pattern, G_N_ELEMENTS(pattern) - 1);
+  const int32_t length =
+      isLocale(where) ? bestPattern(where, skeleton, pattern, G_N_ELEMENTS(pattern) - 1) : 0;
   char date[255] = {};
   if (length > 0) formatDate(where, pattern, length, time, date, sizeof date);
   return g_strdup(date);
