@@ -112,8 +112,14 @@ OwnedAppInfo handlerFor(const std::string& path) {
   return found;
 }
 
-bool resolver_can_open(const char* path) {
-  return path && handlerFor(path);
+std::string pathOfUri(const std::string& uri) {
+  if (uri.compare(0, 1, "/") == 0) return uri;
+  const OwnedText path(g_filename_from_uri(uri.c_str(), nullptr, nullptr));
+  return path ? path.get() : "";
+}
+
+bool resolver_can_open(const char* uri) {
+  return uri && handlerFor(pathOfUri(uri)) != nullptr;
 }
 
 }  // namespace mime
