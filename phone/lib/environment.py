@@ -28,6 +28,8 @@ def phone(state, home, run, language):
         "ELM_PROFILE": "mobile", "ELM_ATSPI_MODE": "1",
         "EINA_LOG_BACKTRACE": "-1", "EINA_LOG_LEVELS": ",".join(_QUIET),
         "XDG_CURRENT_DESKTOP": "phone",
+        # the phone's choice of programs for files stands before the machine's
+        "XDG_DATA_DIRS": "/opt/usr/share:/usr/local/share:/usr/share",
     }
     managed.update(language_of(language))
     locales = os.path.join(ROOT, "build", "locale")

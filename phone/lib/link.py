@@ -72,9 +72,10 @@ def request(state, message, files=()):
     with connection:
         try:
             send(connection, message, files)
-            return receive(connection)[0] or {"error": "the phone went down"}
+            answer = receive(connection)[0]
         except (BrokenPipeError, ConnectionResetError):
-            return {"error": "the phone went down"}
+            answer = None
+    return {"error": "the phone went down"} if answer is None else answer
 
 
 def ask(state, message, files=()):
