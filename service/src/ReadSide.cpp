@@ -98,7 +98,9 @@ void answerContent(SoupServerMessage* message, const Content& content) {
   } else if (range.kind == ByteRange::Kind::Part) {
     answerPart(message, bytes.get(), range);
   } else {
-    soup_message_body_append_bytes(soup_server_message_get_response_body(message), bytes.get());
+    if (content.size() > 0) {
+      soup_message_body_append_bytes(soup_server_message_get_response_body(message), bytes.get());
+    }
     soup_server_message_set_status(message, SOUP_STATUS_OK, nullptr);
   }
 }
