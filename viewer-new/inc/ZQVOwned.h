@@ -6,35 +6,43 @@
 #include <bundle.h>
 #include <glib.h>
 
-#include <memory>
+#include <cstddef>
 #include <type_traits>
+#include <utility>
 
-template <auto Release>
-struct ZQVRelease {
-  template <typename T>
-  void operator()(T* handle) const {
-    Release(handle);
-  }
-};
-
+/// The one owner of a handle that `Release` frees; null owns nothing.
 template <typename T, auto Release>
-using ZQVOwned = std::unique_ptr<T, ZQVRelease<Release>>;
+class ZQVOwned {
+ public:
+  ZQVOwned(std::nullptr_t = nullptr) {}
+  explicit ZQVOwned(T* handle) : _handle(handle) {}
+  ZQVOwned(ZQVOwned&& other) noexcept : _handle(other.release()) {}
+  ~ZQVOwned() { reset(); }
+  ZQVOwned& operator=(ZQVOwned&& other) noexcept {
+    if (this != &other) reset(other.release());
+    return *this;
+  }
+
+  T* get() const { return _handle; }
+  T* operator->() const { return _handle; }
+  T& operator*() const { return *_handle; }
+  explicit operator bool() const { return _handle != nullptr; }
+
+  void reset(T* handle = nullptr) {
+    if (T* old = std::exchange(_handle, handle)) Release(old);
+  }
+  [[nodiscard]] T* release() { return std::exchange(_handle, nullptr); }
+
+  /// Where a C function may write the handle that it gives away.
+  T** out() {
+    reset();
+    return &_handle;
+  }
+
+ private:
+  T* _handle = nullptr;
+};
 
 using ZQVOwnedText = ZQVOwned<char, g_free>;
 using ZQVOwnedAppControl = ZQVOwned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
 using ZQVOwnedBundle = ZQVOwned<bundle, bundle_free>;
-
-/// For C functions that answer through an out-parameter: `get(handle, ZQVOut(text))`.
-template <typename Owner>
-class ZQVOut {
- public:
-  explicit ZQVOut(Owner& owner) : _owner(owner) {}
-  ~ZQVOut() { _owner.reset(_handle); }
-  ZQVOut(const ZQVOut&) = delete;
-  ZQVOut& operator=(const ZQVOut&) = delete;
-  operator typename Owner::pointer *() { return &_handle; }
-
- private:
-  Owner& _owner;
-  typename Owner::pointer _handle = nullptr;
-};

@@ -33,7 +33,7 @@ ZQVAccountCheck::Result ZQVAccountCheck::_checkOvuStatus() {
 bool ZQVAccountCheck::_isOvuAccountExists() {
   OwnedAnswer imsi;
   OwnedAnswer msisdn;
-  int error = ovu_check_account_exist(_handle, ZQVOut(imsi), ZQVOut(msisdn));
+  int error = ovu_check_account_exist(_handle, imsi.out(), msisdn.out());
   if (error) {
     ZQV_ERROR("ovu_exist_account_failed [%d]", error);
     return false;
@@ -46,7 +46,7 @@ bool ZQVAccountCheck::_isOvuAccountExists() {
 
 void ZQVAccountCheck::_checkOvuServiceStatus() {
   OwnedAnswer status;
-  const int error = ovu_get_service_status(_handle, OVU_SERVICE_SHARE, ZQVOut(status), 1);
+  const int error = ovu_get_service_status(_handle, OVU_SERVICE_SHARE, status.out(), 1);
   if (error) {
     ZQV_ERROR("ovu_get_service_status failed [%d]", error);
     ZQV_ERROR("share_check_ovu_service_status failed!");

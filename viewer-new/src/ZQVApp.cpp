@@ -60,7 +60,7 @@ std::vector<ZQVOwnedText> sentPaths(zelqo_share_h handle, unsigned int count) {
   std::vector<ZQVOwnedText> paths(count);
   for (unsigned int i = 0; i < count; ++i) {
     PlatformText path;
-    const int result = zelqo_upload_info_get_content_file_path(handle, i, ZQVOut(path));
+    const int result = zelqo_upload_info_get_content_file_path(handle, i, path.out());
     if (result != ZELQO_ERROR_NONE) {
       ZQV_ERROR("Unexpected SAPI error(get SAPI file path failed)!");
     } else if (!path) {

@@ -135,7 +135,7 @@ void reshareReplyCb(app_control_h, app_control_h reply, app_control_result_e res
   if (result == APP_CONTROL_RESULT_SUCCEEDED) return;
   // The picker tells the user itself what went wrong; its words are fetched and dropped.
   ZQVOwned<char, free> message;
-  app_control_get_extra_data(reply, "errorMessage", ZQVOut(message));
+  app_control_get_extra_data(reply, "errorMessage", message.out());
 }
 
 }  // namespace
@@ -212,7 +212,7 @@ char* ZQViewerCommon::makeThemeMarkup(const char* text, const char* textClass, c
   ZQVOwned<char, free> font;
   int size = 0;
   int r = 0, g = 0, b = 0, a = 0;
-  ea_theme_font_get(textClass, ZQVOut(font), &size);
+  ea_theme_font_get(textClass, font.out(), &size);
   ea_theme_color_get(textClass, &r, &g, &b, &a, nullptr, nullptr, nullptr, nullptr, nullptr,
                      nullptr, nullptr, nullptr);
   char markup[1025] = {};
@@ -287,7 +287,7 @@ void ZQViewerCommon::reshare(const char* fileUrl, bool single) {
     return;
   }
   ZQVOwnedAppControl request;
-  if (app_control_create(ZQVOut(request)) != APP_CONTROL_ERROR_NONE) return;
+  if (app_control_create(request.out()) != APP_CONTROL_ERROR_NONE) return;
   if (!fillReshareRequest(request.get(), fileUrl, single)) return;
   if (app_control_send_launch_request(request.get(), reshareReplyCb, nullptr) !=
       APP_CONTROL_ERROR_NONE) {

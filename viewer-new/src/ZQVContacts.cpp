@@ -34,13 +34,13 @@ Records findByNumber(const char* number) {
   const std::string wanted = dialled(number);
   if (wanted.empty()) return records;
   Filter filter;
-  contacts_filter_create(_contacts_person_number._uri, ZQVOut(filter));
+  contacts_filter_create(_contacts_person_number._uri, filter.out());
   contacts_filter_add_str(filter.get(), _contacts_person_number.number, CONTACTS_MATCH_CONTAINS,
                           wanted.c_str());
   Query query;
-  contacts_query_create(_contacts_person_number._uri, ZQVOut(query));
+  contacts_query_create(_contacts_person_number._uri, query.out());
   contacts_query_set_filter(query.get(), filter.get());
-  const int result = contacts_db_get_records_with_query(query.get(), 0, 0, ZQVOut(records));
+  const int result = contacts_db_get_records_with_query(query.get(), 0, 0, records.out());
   if (result != CONTACTS_ERROR_NONE) {
     ZQV_ERROR("contacts_db_get_records_with_query is failed error_code = %d", result);
     return nullptr;

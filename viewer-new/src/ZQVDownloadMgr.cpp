@@ -50,7 +50,7 @@ std::vector<const char*> listExtensions(const std::vector<ZQViewerThumbnailItem*
 void downloadReplyCb(app_control_h, app_control_h reply, app_control_result_e result, void*) {
   if (result == APP_CONTROL_RESULT_SUCCEEDED) return;
   ZQVOwned<char, free> message;
-  app_control_get_extra_data(reply, "errorMessage", ZQVOut(message));
+  app_control_get_extra_data(reply, "errorMessage", message.out());
 }
 
 void addArray(app_control_h request, const char* key, std::vector<const char*>& values) {
@@ -59,7 +59,7 @@ void addArray(app_control_h request, const char* key, std::vector<const char*>& 
 
 void _launchDownloadApp(FileLists& files, const char* token, const char* sender, bool isWifiOnly) {
   ZQVOwnedAppControl request;
-  if (app_control_create(ZQVOut(request)) != APP_CONTROL_ERROR_NONE) return;
+  if (app_control_create(request.out()) != APP_CONTROL_ERROR_NONE) return;
   if (app_control_set_app_id(request.get(), kDownloadApp) != APP_CONTROL_ERROR_NONE) return;
   if (app_control_set_operation(request.get(), APP_CONTROL_OPERATION_VIEW) !=
       APP_CONTROL_ERROR_NONE) {

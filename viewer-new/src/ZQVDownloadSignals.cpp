@@ -19,7 +19,7 @@ void ZQVDownloadSignals::start(Handler handler) {
   stop();
   _handler = std::move(handler);
   ZQVOwned<GError, g_error_free> error;
-  _bus = g_bus_get_sync(G_BUS_TYPE_SYSTEM, nullptr, ZQVOut(error));
+  _bus = g_bus_get_sync(G_BUS_TYPE_SYSTEM, nullptr, error.out());
   if (!_bus) {
     ZQV_ERROR("bus is NULL! errorMessage:[%s]", error ? error->message : "");
     return;

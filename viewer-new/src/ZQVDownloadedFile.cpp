@@ -45,7 +45,7 @@ std::string namedPath(const ZQViewerThumbnailItem& item) {
 
 bool isMarkedDownloaded(const char* url) {
   ZQVOwned<char, free> value;
-  return preference_get_string(url, ZQVOut(value)) == PREFERENCE_ERROR_NONE &&
+  return preference_get_string(url, value.out()) == PREFERENCE_ERROR_NONE &&
          g_strcmp0(value.get(), url) == 0;
 }
 

@@ -464,7 +464,7 @@ void ZQVFullView::_openFile(const char* path) {
     return;
   }
   ZQVOwnedAppControl request;
-  if (app_control_create(ZQVOut(request)) != APP_CONTROL_ERROR_NONE) return;
+  if (app_control_create(request.out()) != APP_CONTROL_ERROR_NONE) return;
   if (!launchViewer(request.get(), path)) {
     zqvPostStatusMessage("IDS_RSH_TPOP_UNABLE_TO_FIND_APPLICATION_TO_PERFORM_THIS_ACTION");
   }

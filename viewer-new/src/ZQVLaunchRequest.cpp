@@ -20,7 +20,7 @@ ZQVLaunchRequest::ZQVLaunchRequest(app_control_h request)
 
 bool ZQVLaunchRequest::isForViewer(app_control_h request) {
   Text operation;
-  if (app_control_get_operation(request, ZQVOut(operation)) != APP_CONTROL_ERROR_NONE ||
+  if (app_control_get_operation(request, operation.out()) != APP_CONTROL_ERROR_NONE ||
       !operation) {
     ZQV_ERROR("Invalid operation: %s", "operation is NULL");
     return false;
@@ -44,7 +44,7 @@ std::vector<ZQVLaunchRequest::Text> ZQVLaunchRequest::files() const {
   std::vector<Text> files;
   ZQVOwned<char*, free> paths;
   int length = 0;
-  if (app_control_get_extra_data_array(_request, "freemsg_send_data", ZQVOut(paths), &length) !=
+  if (app_control_get_extra_data_array(_request, "freemsg_send_data", paths.out(), &length) !=
       APP_CONTROL_ERROR_NONE) {
     return files;
   }
@@ -54,7 +54,7 @@ std::vector<ZQVLaunchRequest::Text> ZQVLaunchRequest::files() const {
 
 ZQVLaunchRequest::Text ZQVLaunchRequest::_extra(const char* key) const {
   Text value;
-  if (app_control_get_extra_data(_request, key, ZQVOut(value)) != APP_CONTROL_ERROR_NONE) {
+  if (app_control_get_extra_data(_request, key, value.out()) != APP_CONTROL_ERROR_NONE) {
     value.reset();
   }
   return value;

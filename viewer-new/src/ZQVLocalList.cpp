@@ -48,14 +48,14 @@ std::string conditionFor(const char* path) {
 
 bool keepMediaCb(media_info_h media, void* data) {
   ZQVLocalList::Media clone;
-  media_info_clone(ZQVOut(clone), media);
+  media_info_clone(clone.out(), media);
   if (clone) static_cast<MediaList*>(data)->push_back(std::move(clone));
   return true;
 }
 
 char* mimeTypeOf(const char* extension) {
   PlatformText type;
-  mime_type_get_mime_type(extension, ZQVOut(type));
+  mime_type_get_mime_type(extension, type.out());
   const bool known = type && strcmp(type.get(), "application/octet-stream") != 0;
   return g_strdup(known ? type.get() : "unknown");
 }
@@ -69,7 +69,7 @@ PlatformText mediaThumbnailOf(const char* path) {
     return thumbnail;
   }
   if (!media) return thumbnail;
-  const int result = media_info_get_thumbnail_path(media.get(), ZQVOut(thumbnail));
+  const int result = media_info_get_thumbnail_path(media.get(), thumbnail.out());
   if (result != MEDIA_CONTENT_ERROR_NONE) {
     ZQV_ERROR("media_info_get_thumbnail_path failed: %d", result);
   }
@@ -147,7 +147,7 @@ int ZQVLocalList::_mediaInfoCreateByPath(const char* path, Media* media) {
   const MediaConnection connection;
   if (!connection.isOpen()) return -1;
   Filter filter;
-  int result = media_filter_create(ZQVOut(filter));
+  int result = media_filter_create(filter.out());
   if (result != MEDIA_CONTENT_ERROR_NONE) {
     ZQV_ERROR("Fail to create filter: %d", result);
     return -1;

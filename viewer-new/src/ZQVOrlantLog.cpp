@@ -96,7 +96,7 @@ void ZQVOrlantLog::insertEntryPath(app_control_h request, int entry) {
     return;
   }
   ZQVOwned<char, free> caller;
-  app_control_get_caller(request, ZQVOut(caller));
+  app_control_get_caller(request, caller.out());
   _insert("ZQ50", entryPathOf(caller.get(), entry));
 }
 

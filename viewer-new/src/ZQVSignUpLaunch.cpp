@@ -15,12 +15,12 @@ constexpr const char* kSettingOperation = "http://tizen.org/appcontrol/operation
 
 void ZQVSignUpLaunch::setLaunchRequest(app_control_h request) {
   _request.reset();
-  if (request) app_control_clone(ZQVOut(_request), request);
+  if (request) app_control_clone(_request.out(), request);
 }
 
 void ZQVSignUpLaunch::_launchOvu() {
   ZQVOwnedAppControl launch;
-  app_control_clone(ZQVOut(launch), _request.get());
+  app_control_clone(launch.out(), _request.get());
   int error = app_control_set_app_id(launch.get(), kSignUpApp);
   if (error) {
     ZQV_ERROR("app_control_set_app_id error (%d)", error);
@@ -38,7 +38,7 @@ void ZQVSignUpLaunch::_launchOvu() {
     ZQV_ERROR("app_control_set_launch_mode error (%d)", error);
     return;
   }
-  error = app_control_export_as_bundle(launch.get(), ZQVOut(_bundle));
+  error = app_control_export_as_bundle(launch.get(), _bundle.out());
   if (error) {
     ZQV_ERROR("app_control_export_as_bundle error (%d)", error);
     return;
@@ -48,7 +48,7 @@ void ZQVSignUpLaunch::_launchOvu() {
 
 void ZQVSignUpLaunch::_launchOvuSettingUi() {
   ZQVOwnedAppControl launch;
-  app_control_clone(ZQVOut(launch), _request.get());
+  app_control_clone(launch.out(), _request.get());
   int error = app_control_set_app_id(launch.get(), kSignUpApp);
   if (error) {
     ZQV_ERROR("app_control_set_app_id error (%d)", error);
@@ -59,7 +59,7 @@ void ZQVSignUpLaunch::_launchOvuSettingUi() {
     ZQV_ERROR("app_control_set_operation error (%d)", error);
     return;
   }
-  error = app_control_export_as_bundle(launch.get(), ZQVOut(_bundle));
+  error = app_control_export_as_bundle(launch.get(), _bundle.out());
   // Unlike the authentication page, this one is forwarded all the same.
   if (error) ZQV_ERROR("app_control_export_as_bundle error (%d)", error);
   _forward();

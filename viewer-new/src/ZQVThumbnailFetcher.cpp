@@ -31,7 +31,7 @@ using PlatformText = ZQVOwned<char, free>;
 /// Null when nothing is stored under the key.
 PlatformText preferenceOf(const char* key) {
   PlatformText value;
-  if (preference_get_string(key, ZQVOut(value)) != PREFERENCE_ERROR_NONE) value.reset();
+  if (preference_get_string(key, value.out()) != PREFERENCE_ERROR_NONE) value.reset();
   return value;
 }
 
@@ -127,7 +127,7 @@ void ZQVThumbnailFetcher::_readContentInfo(zelqo_share_h handle, int serviceInde
                                            ZQViewerThumbnailItem* item) {
   PlatformText url;
   const int result = zelqo_content_info_get_download_url(
-      handle, static_cast<unsigned int>(serviceIndex), ZQVOut(url));
+      handle, static_cast<unsigned int>(serviceIndex), url.out());
   replaceText(&item->downloadUrl, result == ZELQO_ERROR_NONE ? url.get() : nullptr);
   const ZQVOwnedText icon(ZQVIcons::_getOthersIconPath(item->mimeType, true));
   if (icon) replaceText(&item->thumbPath, icon.get());
@@ -157,7 +157,7 @@ void ZQVThumbnailFetcher::_reqMidThumbnail(zelqo_share_h handle) {
   EINA_LIST_FOREACH(_items, node, data) {
     PlatformText type;
     const auto number = static_cast<unsigned int>(_serviceIndices[position++]);
-    if (zelqo_content_info_get_content_type(handle, number, ZQVOut(type)) != ZELQO_ERROR_NONE) {
+    if (zelqo_content_info_get_content_type(handle, number, type.out()) != ZELQO_ERROR_NONE) {
       ZQV_ERROR("zelqo_content_info_get_content_type");
       return;
     }

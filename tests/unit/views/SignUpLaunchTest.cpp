@@ -10,7 +10,7 @@ using testing::IsEmpty;
 class SignUpLaunch : public PhoneTest {
  protected:
   SignUpLaunch() {
-    app_control_create(ZQVOut(request));
+    app_control_create(request.out());
     app_control_set_operation(request.get(), "http://tizen.org/appcontrol/operation/launch_viewer");
     app_control_add_extra_data(request.get(), "request_id", "7");
     launch.setLaunchRequest(request.get());

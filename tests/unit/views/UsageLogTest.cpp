@@ -22,7 +22,7 @@ class UsageLog : public PhoneTest {
     phone.reset();
     phone.caller = caller;
     ZQVOwnedAppControl request;
-    app_control_create(ZQVOut(request));
+    app_control_create(request.out());
     ZQVOrlantLog::getInstance().insertEntryPath(request.get(), entry);
     return phone.usage.size() == 1 ? phone.usageOf("ZQ50").at(0) : "";
   }
