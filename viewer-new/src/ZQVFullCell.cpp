@@ -74,6 +74,8 @@ void addFile(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* 
   common.setClickable(icon, grid, ZQVPictureButton::_mouseUpCb, ZQVPictureButton::_mouseDownCb,
                       nullptr);
   elm_object_part_content_set(layout, "logo_bg", common.createIcon(grid, kShadow));
+  // Name and size stand on a card of the theme's own, legible in light and dark.
+  elm_layout_signal_emit(layout, "elm,state,card,show", "elm");
   Evas_Object* name = addName(item, layout);
   Evas_Object* size = addSize(item, layout);
   if (!isDimmed(item, grid)) return;
