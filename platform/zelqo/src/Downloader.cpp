@@ -10,12 +10,6 @@ namespace {
 
 constexpr std::size_t kMaxAddress = 2048;
 
-MessageOwner messageFor(const std::string& url) {
-  if (url.size() > kMaxAddress) return nullptr;
-  if (url.rfind("http://", 0) != 0 && url.rfind("https://", 0) != 0) return nullptr;
-  return MessageOwner(soup_message_new(SOUP_METHOD_GET, url.c_str()));
-}
-
 // Addresses let their holder in, so the log does not get them whole.
 std::string nameInLog(const std::string& url) {
   constexpr std::size_t shown = 24;
@@ -90,7 +84,8 @@ void Downloader::pump() {
 }
 
 void Downloader::start(Job job) {
-  MessageOwner message = messageFor(job.url());
+  MessageOwner message =
+      job.url().size() <= kMaxAddress ? makeMessage(SOUP_METHOD_GET, job.url()) : nullptr;
   if (!message) {
     g_warning("zelqo: not an address to fetch from: %s", nameInLog(job.url()).c_str());
     report(job, ZELQO_ERROR_INVALID_PARAMETER, nullptr);

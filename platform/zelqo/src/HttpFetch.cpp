@@ -17,6 +17,14 @@ SessionOwner makeSession(int connections, guint inactivityS) {
                                                     "user-agent", "zelqo", nullptr));
 }
 
+MessageOwner makeMessage(const char* method, const std::string& url) {
+  if (url.rfind("http://", 0) != 0 && url.rfind("https://", 0) != 0) return nullptr;
+  const base::Owned<GUri, g_uri_unref> uri(
+      g_uri_parse(url.c_str(), static_cast<GUriFlags>(SOUP_HTTP_URI_FLAGS), nullptr));
+  const char* host = uri ? g_uri_get_host(uri.get()) : nullptr;
+  return MessageOwner(host && *host ? soup_message_new_from_uri(method, uri.get()) : nullptr);
+}
+
 HttpFetch::HttpFetch(SoupSession* session, MessageOwner message, Limits limits, Sink sink,
                      Done done)
     : _message(std::move(message)),

@@ -18,6 +18,8 @@ using MessageOwner = base::Owned<SoupMessage, g_object_unref>;
 
 /// At most `connections` at a time; `inactivityS` without a byte ends a request.
 SessionOwner makeSession(int connections, guint inactivityS);
+/// Null for what is not the address of a web server.
+MessageOwner makeMessage(const char* method, const std::string& url);
 
 class HttpFetch {
  public:

@@ -60,7 +60,7 @@ ServiceClient::ServiceClient(std::string url, guint deadlineMs)
 ServiceClient::~ServiceClient() = default;
 
 MessageOwner ServiceClient::message(const Request& request) const {
-  MessageOwner message(soup_message_new(request.method, (_url + request.path).c_str()));
+  MessageOwner message = makeMessage(request.method, _url + request.path);
   if (!message) return nullptr;
   if (!request.key.empty()) {
     soup_message_headers_replace(soup_message_get_request_headers(message.get()), "Authorization",
