@@ -37,6 +37,7 @@ void setCaller(bundle& request, const Caller& caller, bool replyWanted) {
 AppService::AppService(std::string appId) : _appId(std::move(appId)) {}
 
 AppService::~AppService() {
+  if (_named) releaseName(_bus.get(), busName(_appId));
   if (_idle) g_source_remove(_idle);
   if (_object) g_dbus_connection_unregister_object(_bus.get(), _object);
 }
@@ -55,9 +56,9 @@ bool AppService::start(std::function<void()> onNameLost) {
       base::SignalSubscription::Match{"org.freedesktop.DBus", "org.freedesktop.DBus", "NameLost",
                                       "/org/freedesktop/DBus", name.c_str()},
       nameLostCb, this);
-  if (_object && requestName(_bus.get(), name, replaceExisting | doNotQueue)) return true;
-  dlog_print(DLOG_ERROR, kTag, "%s is running already", _appId.c_str());
-  return false;
+  _named = _object && requestName(_bus.get(), name, replaceExisting | doNotQueue);
+  if (!_named) dlog_print(DLOG_ERROR, kTag, "%s is running already", _appId.c_str());
+  return _named;
 }
 
 void AppService::nameLostCb(GDBusConnection*, const char*, const char*, const char*, const char*,

@@ -106,4 +106,8 @@ bool requestName(GDBusConnection* bus, const std::string& name, unsigned flags) 
   return result == primaryOwner || result == inQueue || result == alreadyOwner;
 }
 
+void releaseName(GDBusConnection* bus, const std::string& name) {
+  askBus(bus, "ReleaseName", g_variant_new("(s)", name.c_str()));
+}
+
 }  // namespace appfw

@@ -10,11 +10,7 @@ CallerName::CallerName(const std::string& appId) : _bus(base::sessionBus()), _na
 }
 
 CallerName::~CallerName() {
-  if (!_valid) return;
-  base::OwnedVariant answer(g_dbus_connection_call_sync(
-      _bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
-      "ReleaseName", g_variant_new("(s)", _name.c_str()), nullptr, G_DBUS_CALL_FLAGS_NONE, 1000,
-      nullptr, nullptr));
+  if (_valid) releaseName(_bus.get(), _name);
 }
 
 }  // namespace appfw

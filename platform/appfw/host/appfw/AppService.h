@@ -49,6 +49,7 @@ class AppService {
   base::OwnedBus _bus;
   unsigned _object = 0;
   unsigned _idle = 0;
+  bool _named = false;
   std::function<void()> _onNameLost;
   RequestHandler _handler;
   std::deque<Request> _waiting;

@@ -31,5 +31,6 @@ Caller findCaller(GDBusConnection* bus, const char* sender);
 /// Asks for an application's name for this process. Flags are the bus's own; true when it is owned,
 /// or at least queued for where the flags allow that.
 bool requestName(GDBusConnection* bus, const std::string& name, unsigned flags);
+void releaseName(GDBusConnection* bus, const std::string& name);
 
 }  // namespace appfw

@@ -1,0 +1,117 @@
+#include "LogLine.h"
+#include "TestPhone.h"
+
+#include <dlog.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <climits>
+
+using dlog::logLine;
+using dlog::oneLine;
+
+namespace {
+
+constexpr size_t kPlenty = 4096;
+
+/// What a piece of code writes to stderr.
+template <typename Code>
+std::string stderrOf(Code code) {
+  testing::internal::CaptureStderr();
+  code();
+  return testing::internal::GetCapturedStderr();
+}
+
+}  // namespace
+
+TEST(LogLine, CarriesPriorityTagAndProcess) {
+  EXPECT_EQ(logLine('E', "ZQ_VIEWER", 42, "text"), "E/ZQ_VIEWER(   42): text\n");
+}
+
+TEST(LogLine, KeepsColours) {
+  EXPECT_EQ(oneLine("a.cpp: f(1) > \033[0;31m* Critical * no\033[0;m", kPlenty),
+            "a.cpp: f(1) > \033[0;31m* Critical * no\033[0;m");
+}
+
+TEST(LogLine, KeepsTwoLineBreaksAsTextInOneLine) {
+  EXPECT_EQ(oneLine("connection is failed\n\n", kPlenty), "connection is failed\\n\\n");
+}
+
+TEST(LogLine, CannotBeForgedByAText) {
+  const struct {
+    const char* text;
+    const char* line;
+  } cases[] = {
+      {"a\nE/OTHER(    1): b", "a\\nE/OTHER(    1): b"},
+      {"a\rb", "a\\rb"},
+      {"a\033[2Jb", "a\\x1b[2Jb"},
+      {"a\033]0;title\ab", "a\\x1b]0;title\\x07b"},
+      {"a\033[0;31", "a\\x1b[0;31"},
+      {"a\xc2\x85"
+       "b",
+       "a\\xc2\\x85b"},
+      {"a\xe2\x80\xa8"
+       "b",
+       "a\\xe2\\x80\\xa8b"},
+  };
+  for (const auto& [text, line] : cases) EXPECT_EQ(oneLine(text, kPlenty), line);
+}
+
+TEST(LogLine, EscapesWhatIsNotUtf8AndKeepsWhatIs) {
+  EXPECT_EQ(oneLine("caf\xc3\xa9 \xff\xe2\x82", kPlenty), "caf\xc3\xa9 \\xff\\xe2\\x82");
+}
+
+TEST(LogLine, IsCutBeforeItCouldMixWithAnothers) {
+  const std::string line = logLine('I', "TAG", 1, std::string(100000, 'x'));
+  EXPECT_LE(line.size(), static_cast<size_t>(PIPE_BUF));
+  EXPECT_EQ(line.substr(line.size() - 9), "\033[0;m...\n");
+}
+
+TEST(LogLine, CutsALongTagAsWell) {
+  EXPECT_LE(logLine('I', std::string(100000, 't'), 1, "x").size(), 100u);
+}
+
+TEST(Log, WritesOneLineToStderr) {
+  std::string expected = logLine('E', "TAG", getpid(), "7 times");
+  int written = 0;
+  EXPECT_EQ(stderrOf([&] { written = dlog_print(DLOG_ERROR, "TAG", "%d %s", 7, "times"); }),
+            expected);
+  EXPECT_EQ(written, static_cast<int>(expected.size()));
+}
+
+TEST(Log, HasALetterForEveryPriority) {
+  const struct {
+    log_priority priority;
+    char letter;
+  } cases[] = {{DLOG_VERBOSE, 'V'}, {DLOG_DEBUG, 'D'}, {DLOG_INFO, 'I'},
+               {DLOG_WARN, 'W'},    {DLOG_ERROR, 'E'}, {DLOG_FATAL, 'F'}};
+  for (const auto& [priority, letter] : cases) {
+    const std::string line = stderrOf([p = priority] { dlog_print(p, "T", "x"); });
+    ASSERT_FALSE(line.empty());
+    EXPECT_EQ(line[0], letter);
+  }
+}
+
+TEST(Log, RefusesMissingTagFormatAndUnknownPriority) {
+  const char* none = nullptr;
+  va_list nothing{};
+  EXPECT_EQ(stderrOf([&] {
+              EXPECT_EQ(dlog_print(DLOG_ERROR, none, "x"), DLOG_ERROR_INVALID_PARAMETER);
+              EXPECT_EQ(dlog_vprint(DLOG_ERROR, "T", none, nothing), DLOG_ERROR_INVALID_PARAMETER);
+              EXPECT_EQ(dlog_print(DLOG_UNKNOWN, "T", "x"), DLOG_ERROR_INVALID_PARAMETER);
+              EXPECT_EQ(dlog_print(DLOG_PRIO_MAX, "T", "x"), DLOG_ERROR_INVALID_PARAMETER);
+            }),
+            "");
+}
+
+TEST(Log, IsSilentAtSilent) {
+  EXPECT_EQ(stderrOf([] { EXPECT_EQ(dlog_print(DLOG_SILENT, "T", "x"), 0); }), "");
+}
+
+TEST(Log, LeavesErrnoAlone) {
+  stderrOf([] {
+    errno = ENOTDIR;
+    dlog_print(DLOG_ERROR, "T", "x");
+    EXPECT_EQ(errno, ENOTDIR);
+  });
+}
