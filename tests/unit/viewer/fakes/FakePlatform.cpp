@@ -12,12 +12,15 @@
 #include <mime_type.h>
 #include <net_connection.h>
 #include <notification_status.h>
+#include <orlant_log_manager.h>
 #include <sys/stat.h>
+#include <system_settings.h>
 #include <vconf.h>
 
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
+#include <ctime>
 
 #include "ZQVSharedFiles.h"
 
@@ -195,7 +198,9 @@ int contacts_connect(void) {
 int contacts_disconnect(void) {
   return platform().contactsConnectError;
 }
-int contacts_db_add_changed_cb(const char*, contacts_db_changed_cb, void*) {
+int contacts_db_add_changed_cb(const char*, contacts_db_changed_cb callback, void* data) {
+  platform().contactsChanged = callback;
+  platform().contactsChangedData = data;
   return platform().contactsConnectError;
 }
 int contacts_db_remove_changed_cb(const char*, contacts_db_changed_cb, void*) {
@@ -406,6 +411,52 @@ Eina_Bool ea_theme_color_get(const char* code, int* r, int* g, int* b, int* a, i
 Eina_Bool ea_theme_object_color_set(Evas_Object* object, const char* code) {
   evas_object_data_set(object, "test_color", strdup(code));
   return EINA_TRUE;
+}
+
+char* app_get_shared_resource_path(void) {
+  return strdup(VIEWER_RESOURCES "/");
+}
+
+int system_settings_set_changed_cb(system_settings_key_e key, system_settings_changed_cb callback,
+                                   void* data) {
+  platform().watchedSettings.push_back(key);
+  platform().settingCallbacks[key] = {reinterpret_cast<void (*)(int, void*)>(callback), data};
+  return 0;
+}
+
+int system_settings_unset_changed_cb(system_settings_key_e) {
+  return 0;
+}
+
+int orlant_log_manager_create(orlant_log_manager_h* handle) {
+  *handle = reinterpret_cast<orlant_log_manager_h>(&platform());
+  return 0;
+}
+
+int orlant_log_manager_insert(orlant_log_manager_h, const char*, bundle*,
+                              orlant_log_manager_reply_cb, void*, int*) {
+  ++platform().usageRecords;
+  return 0;
+}
+
+int orlant_log_manager_destroy(orlant_log_manager_h) {
+  return 0;
+}
+
+time_t time(time_t* now) noexcept {
+  const time_t answer = platform().now ? static_cast<time_t>(platform().now)
+                                       : static_cast<time_t>(real("time", time)(nullptr));
+  if (now) *now = answer;
+  return answer;
+}
+
+void elm_exit(void) {
+  ++platform().exits;
+}
+
+void elm_win_lower(Evas_Object* window) {
+  ++platform().lowered;
+  real("elm_win_lower", elm_win_lower)(window);
 }
 
 // Files of the phone

@@ -94,6 +94,15 @@ struct FakePlatform {
   std::string failingExtra;  ///< the launch extra that cannot be added
   int gridRefreshes = 0;
 
+  long long now = 0;  ///< seconds since the epoch; 0 is the real time
+  int exits = 0;
+  int lowered = 0;
+  int usageRecords = 0;
+  std::map<int, std::pair<void (*)(int, void*), void*>> settingCallbacks;
+  std::vector<int> watchedSettings;
+  void (*contactsChanged)(const char*, void*) = nullptr;
+  void* contactsChangedData = nullptr;
+
   /// What the file manager recorded, download address to path.
   std::map<std::string, std::string> recordedFiles;
   /// Stands for the phone's files: every path below /opt/usr that exists.

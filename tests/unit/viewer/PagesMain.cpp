@@ -1,0 +1,27 @@
+#include <gio/gio.h>
+#include <libintl.h>
+#include <unistd.h>
+
+#include <cstdlib>
+
+#include "PageTest.h"
+
+int main(int argc, char** argv) {
+  // A system bus of its own, whatever runs around.
+  GTestDBus* bus = g_test_dbus_new(G_TEST_DBUS_NONE);
+  g_test_dbus_up(bus);
+  setenv("DBUS_SYSTEM_BUS_ADDRESS", g_test_dbus_get_bus_address(bus), 1);
+  setenv("ELM_ENGINE", "buffer", 1);
+  setenv("ELM_PROFILE", "mobile", 1);
+  setenv("LC_ALL", "C.UTF-8", 1);
+  setenv("LANGUAGE", "en", 1);
+  setenv("TZ", "UTC", 1);
+
+  testing::InitGoogleTest(&argc, argv);
+  TestViewer viewer(argc, argv);
+  viewer.start(argc, argv);
+  // Without the clean-up of GIO: it would wait for connections that live as long as the process.
+  fflush(stdout);
+  g_test_dbus_stop(bus);
+  _exit(viewer.result());
+}
