@@ -34,7 +34,7 @@ struct WApp::Private {
   bool paused = false;
 
   bool takeName();
-  void setUpToolkit();
+  bool setUpToolkit();
   int run();
   void tearDown();
   void followSettings(bool follow);
@@ -72,8 +72,12 @@ int WApp::start(int argc, char** argv) {
   theApp = this;
   if (!_d->takeName()) return EXIT_FAILURE;
   if (!elm_init(argc, argv)) return EXIT_FAILURE;
-  _d->setUpToolkit();
-  const int status = onStart() ? _d->run() : EXIT_FAILURE;
+  int status = EXIT_FAILURE;
+  if (_d->setUpToolkit()) {
+    if (onStart()) status = _d->run();
+    _d->followSettings(false);
+    ecore_x_shutdown();
+  }
   _d->service.reset();
   elm_shutdown();
   theApp = nullptr;
@@ -104,18 +108,23 @@ bool WApp::Private::takeName() {
   return service->start([] { elm_exit(); });
 }
 
-/// The language follows its setting before anybody else hears of a change, so the framework
-/// listens first.
-void WApp::Private::setUpToolkit() {
+/// The display is opened before the first window, for its size decides the scale. The language
+/// follows its setting before anybody else hears of a change, so the framework listens first.
+bool WApp::Private::setUpToolkit() {
+  if (!ecore_x_init(nullptr)) {
+    dlog_print(DLOG_ERROR, "APP_ASSIST", "no display");
+    return false;
+  }
   installGlibBridge();
   followSettings(true);
   Language::bindCatalogues();
   Language::apply();
   DeviceTheme::install();
-  visibility = ecore_event_handler_add(ECORE_X_EVENT_WINDOW_VISIBILITY_CHANGE, visibilityCb, this);
+  return true;
 }
 
 int WApp::Private::run() {
+  visibility = ecore_event_handler_add(ECORE_X_EVENT_WINDOW_VISIBILITY_CHANGE, visibilityCb, this);
   if (self->onCreate()) {
     if (service) service->deliverTo([this](app_control_h request) { self->onAppControl(request); });
     elm_run();
@@ -134,7 +143,6 @@ void WApp::Private::tearDown() {
   self->onTerminate();
   window.reset();
   LateDestroyer::instance().flush();
-  followSettings(false);
 }
 
 void WApp::Private::followSettings(bool follow) {

@@ -51,6 +51,9 @@ void WNaviframeController::pop() {
 
 void WNaviframeController::destroyAllViewControllers() {
   _n->pendingPops = 0;
+  // Popups speak to their pages when they go, so they go while the pages are whole.
+  for (WContentViewController* view : _n->pages) view->_c->closePopups();
+  LateDestroyer::instance().flush();
   while (Elm_Object_Item* top = getEvasObj() ? elm_naviframe_top_item_get(getEvasObj()) : nullptr)
     elm_object_item_del(top);
   // What is left slides out: the toolkit keeps its item until then, empty.
