@@ -15,7 +15,7 @@ typedef enum {
 
 typedef struct orlant_log_manager_s* orlant_log_manager_h;
 
-/// Called on the main loop when the record is stored or refused.
+/// Called on the main loop when the record is stored or refused; not after the handle is destroyed.
 typedef void (*orlant_log_manager_reply_cb)(int request_id, int error, void* user_data);
 
 int orlant_log_manager_create(orlant_log_manager_h* handle);

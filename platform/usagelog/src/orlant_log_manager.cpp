@@ -13,6 +13,7 @@ constexpr const char* kSchema =
     "time INTEGER NOT NULL, uri TEXT NOT NULL, app_id TEXT, feature TEXT, extra TEXT)";
 
 struct Reply {
+  std::weak_ptr<bool> handle;
   orlant_log_manager_reply_cb callback;
   void* userData;
   int requestId;
@@ -21,7 +22,7 @@ struct Reply {
 
 gboolean deliver(gpointer data) {
   const auto* reply = static_cast<Reply*>(data);
-  reply->callback(reply->requestId, reply->error, reply->userData);
+  if (!reply->handle.expired()) reply->callback(reply->requestId, reply->error, reply->userData);
   return G_SOURCE_REMOVE;
 }
 
@@ -53,6 +54,7 @@ bool insert(store::Database& database, const char* uri, bundle* data) {
 struct orlant_log_manager_s {
   std::unique_ptr<store::Database> database;
   int lastRequest = 0;
+  std::shared_ptr<bool> alive = std::make_shared<bool>(true);
 };
 
 int orlant_log_manager_create(orlant_log_manager_h* handle) {
@@ -73,8 +75,8 @@ int orlant_log_manager_insert(orlant_log_manager_h handle, const char* content_u
   const int error =
       insert(*handle->database, content_uri, data) ? ORLANT_LOG_ERROR_NONE : ORLANT_LOG_ERROR_STORE;
   if (callback) {
-    g_idle_add_full(G_PRIORITY_DEFAULT, deliver, new Reply{callback, user_data, request, error},
-                    deleteReply);
+    g_idle_add_full(G_PRIORITY_DEFAULT, deliver,
+                    new Reply{handle->alive, callback, user_data, request, error}, deleteReply);
   }
   return ORLANT_LOG_ERROR_NONE;
 }
