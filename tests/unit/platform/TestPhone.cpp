@@ -2,6 +2,8 @@
 
 #include <signal.h>
 #include <sys/prctl.h>
+#include <sys/wait.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <cstdlib>
@@ -65,6 +67,7 @@ void TestPhone::SetUp() {
 
 void TestPhone::TearDown() {
   kill(_bus, SIGTERM);
+  waitpid(_bus, nullptr, 0);
   std::filesystem::remove_all(root());
 }
 
