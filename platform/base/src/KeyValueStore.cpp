@@ -23,6 +23,12 @@ std::string folderOf(const std::string& path) {
   return folder.get();
 }
 
+int checkFile(const std::string& path) {
+  StoreConnection connection;
+  const int code = connection.open(path, false);
+  return code == SQLITE_OK ? connection.check() : code;
+}
+
 /// Holds other processes back while a damaged store is moved aside. Locks the folder, so that no
 /// lock file stays behind.
 class FolderLock {
@@ -60,11 +66,8 @@ int KeyValueStore::connect(bool create) {
 int KeyValueStore::moveAsideIfDamaged() {
   _connection.reset();
   FolderLock lock(folderOf(_path));
-  StoreConnection again;
-  int code = again.open(_path, false);
-  if (code == SQLITE_OK) code = again.check();
+  const int code = checkFile(_path);
   if (!damaged(code)) return code;
-  again = StoreConnection();
   dlog_print(DLOG_ERROR, kTag, "%s is damaged; it becomes .corrupt and a new one is begun",
              _path.c_str());
   for (const char* part : {"", "-wal", "-shm"})

@@ -12,6 +12,10 @@ namespace base {
 
 class StoreConnection {
  public:
+  StoreConnection() = default;
+  StoreConnection(const StoreConnection&) = delete;
+  StoreConnection& operator=(const StoreConnection&) = delete;
+
   int open(const std::string& path, bool create);
   int check();
 
@@ -31,7 +35,7 @@ class StoreConnection {
   int prepare(const char* sql, Statement& statement);
   int prepareAll();
 
-  Owned<sqlite3, sqlite3_close> _db;
+  Owned<sqlite3, sqlite3_close> _db;  ///< declared first: closed after its statements are gone
   Statement _get, _set, _remove, _removeAll, _keys;
 };
 
