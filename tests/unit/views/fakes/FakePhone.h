@@ -90,5 +90,8 @@ struct FakePhone {
 
   std::map<std::string, std::string> preferences;
   std::string caller;
+  /// How often the application was asked to end.
   int exits = 0;
+  /// Negative: buttons can always be made.
+  int buttonsUntilFailure = -1;
 };
