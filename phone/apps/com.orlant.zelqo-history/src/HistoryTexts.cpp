@@ -46,7 +46,7 @@ bool isGone(const zelqo::ShareSummary& share, std::int64_t nowMs) {
 }
 
 std::string detailOf(const zelqo::ShareSummary& share, std::int64_t nowMs) {
-  return filesText(share) + "\n" + stateText(share, nowMs);
+  return filesText(share) + " · " + stateText(share, nowMs);
 }
 
 }  // namespace history

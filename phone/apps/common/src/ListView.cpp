@@ -14,6 +14,9 @@ constexpr const char* kEnd = "companion.end";
 constexpr const char* kProgress = "companion.progress";
 constexpr const char* kActions = "companion.actions";
 
+// The plain text button of the device theme.
+constexpr const char* kActionStyle = "naviframe/title_left";
+
 bool haveSameWidgets(const Row& left, const Row& right) {
   if (left.icon != right.icon || left.checked != right.checked ||
       left.progress.has_value() != right.progress.has_value() ||
@@ -148,7 +151,7 @@ Evas_Object* ListView::_content(Cell& cell, const char* part) {
   elm_box_padding_set(box, ELM_SCALE_SIZE(16), 0);
   elm_box_align_set(box, 0.0, 0.5);
   for (const auto& action : row.actions) {
-    elm_box_pack_end(box, makeButton(box, "companion", action.label, action.run,
+    elm_box_pack_end(box, makeButton(box, kActionStyle, action.label, action.run,
                                      action.label + " " + row.title));
   }
   return box;

@@ -47,7 +47,6 @@ Evas_Object* makeCheck(Evas_Object* parent, bool on, const std::string& name) {
 
 Evas_Object* makeProgress(Evas_Object* parent, double value) {
   Evas_Object* bar = elm_progressbar_add(parent);
-  elm_object_style_set(bar, "companion");
   elm_progressbar_unit_format_set(bar, nullptr);
   elm_progressbar_value_set(bar, value);
   evas_object_show(bar);
