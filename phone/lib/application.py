@@ -87,6 +87,14 @@ def log(state, args):
     _print(state.path("run", "log", application + ".log"))
 
 
+def messages(state, args):
+    """The status-bar messages of this boot, one per line."""
+    parse(args, usage="phone messages")
+    import html
+    for line in _lines(state.path("run", "messages")):
+        sys.stdout.write(html.unescape(line))
+
+
 def launches(state, args):
     """Launch requests that left the viewer; with --all, those of every application."""
     everybody = parse(args, flags=("all",), usage="phone launches [--all]").get("all")

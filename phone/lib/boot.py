@@ -15,6 +15,7 @@ from lib import environment, image, leftovers, sandbox
 from lib.report import Failure
 from lib.state import ROOT
 
+_LONGEST_RUN = 85  # a socket's path has 107 bytes at most
 _PR_SET_PDEATHSIG, _PR_SET_CHILD_SUBREAPER = 1, 36
 
 
@@ -25,6 +26,8 @@ def boot(state, settings):
         raise Failure(f"a phone is already up in {state.folder}")
     leftovers.end(state)
     reason = sandbox.why_not()
+    if reason and len(state.path("run")) > _LONGEST_RUN:
+        raise Failure(f"without a sandbox the path {state.path('run')} is too long for sockets")
     settings["sandbox"] = "no (" + reason + ")" if reason else "yes"
     _prepare(state, settings)
     if reason:
@@ -60,6 +63,7 @@ def _prepare(state, settings):
 def _configure_notifications(state, width):
     with open(os.path.join(ROOT, "phone", "etc", "dunstrc"), encoding="utf-8") as file:
         text = file.read().replace("width = 720", f"width = {width}", 1)
+    text = text.replace("RECORDER", os.path.join(ROOT, "phone", "lib", "phone-message"))
     with open(state.path("run", "dunstrc"), "w", encoding="utf-8") as file:
         file.write(text)
 

@@ -10,11 +10,13 @@ from lib.state import State
 
 # command: module that has a function of that name, called with (state, arguments)
 COMMANDS = {
-    "up": "power", "down": "power", "status": "power",
+    "up": "power", "down": "power", "status": "power", "wait": "power",
     "share": "share",
     "launch": "application", "log": "application", "launches": "application",
+    "messages": "application",
     "usage": "application", "prefs": "application",
     "tree": "screen", "tap": "screen", "swipe": "screen", "key": "screen", "screenshot": "screen",
+    "painted": "screen",
     "network": "world", "rotate": "world", "signal": "world", "signals": "world",
     "clock": "world", "language": "world", "account": "world", "service": "world",
     "contact": "world",

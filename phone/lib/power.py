@@ -1,4 +1,4 @@
-"""up, down, status."""
+"""up, down, status, wait."""
 
 import os
 import sys
@@ -62,6 +62,12 @@ def down(state, args):
         from lib import leftovers
         leftovers.end(state)
         print("phone: was down", file=sys.stderr)
+
+
+def wait(state, args):
+    """Returns when the phone has gone down, for whatever reason."""
+    parse(args, usage="phone wait")
+    link.request(state, {"do": "wait"})
 
 
 def status(state, args):

@@ -9,6 +9,8 @@ from lib.report import Failure, Usage
 
 _SWIPE = "phone swipe X,Y X,Y [MILLISECONDS]"
 _PATIENCE = 5.0  # seconds, for a widget to appear
+_PAINTING = 60.0  # seconds, for a whole page
+_STILL = 7         # equal pictures in a row: longer than pages wait to paint what came late
 _STEP = 0.016    # seconds between two movements of the finger
 
 
@@ -34,6 +36,26 @@ def screenshot(state, args):
         else:
             os.unlink(passing)
     return status
+
+
+def painted(state, args):
+    """Waits until that many items with names are to be seen and nothing moves any more."""
+    words = parse(args, words=(0, 1), usage="phone painted [ITEMS]").words
+    wanted = number(words[0], "the number of items", 0, 10000) if words else 1
+    from lib import widgets
+    end, before, still = time.monotonic() + _PAINTING, None, 0
+    while time.monotonic() < end:
+        seen = widgets.read(link.output(state, [state.tool("phone-tree")]),
+                            state.settings()["screen"])
+        items = [widget for widget in seen if widgets.can_be_tapped(widget) and widget.name
+                 and "item" in widget.role]
+        now = link.output(state, ["sh", "-c", '"$0" | cksum', state.tool("phone-screen")])
+        still = still + 1 if now == before and len(items) >= wanted else 0
+        if still >= _STILL:
+            return
+        before = now
+        time.sleep(0.2)
+    raise Failure(f"there are not {wanted} items on the screen, or it does not come to rest")
 
 
 def tap(state, args):

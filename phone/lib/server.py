@@ -23,14 +23,22 @@ def _answer(phone, connection):
         try:
             message, files = link.receive(connection)
             if message is not None:
-                link.send(connection, _do(phone, message, files, connection))
-        except Failure as failure:
-            link.send(connection, {"error": str(failure)})
-        except (OSError, ValueError, KeyError, TypeError) as error:
+                link.send(connection, _try(phone, message, files, connection))
+        except (OSError, ValueError) as error:
             print(f"a caller was not served: {error!r}", flush=True)
         finally:
             for file in files:
                 os.close(file)
+
+
+def _try(phone, message, files, connection):
+    try:
+        return _do(phone, message, files, connection)
+    except Failure as failure:
+        return {"error": str(failure)}
+    except (OSError, ValueError, KeyError, TypeError) as error:
+        print(f"{message} failed: {error!r}", flush=True)
+        return {"error": f"the phone failed: {error!r}"}
 
 
 def _do(phone, message, files, connection):
@@ -44,6 +52,9 @@ def _do(phone, message, files, connection):
         return {}
     if what == "service":
         phone.sharing.change(message["mode"], message.get("delay", 0))
+        return {}
+    if what == "wait":
+        phone.over.wait()
         return {}
     if what == "down":
         os.kill(os.getpid(), signal.SIGTERM)

@@ -29,10 +29,12 @@ class Sharing:
         The service keeps its address and what it stores."""
         if self._phone.settings["service"]:
             raise Failure("this phone uses another phone's service")
-        if self._service is None:
+        if not self.url:
             raise Failure("the sharing service was not built")
-        self._service.end()
-        self._phone.programs.remove(self._service)
+        if self._service:
+            self._service.end()
+            self._phone.programs.remove(self._service)
+            self._service = None
         if mode != "down":
             self._start_service({"ok": [], "slow": ["--delay", str(delay)],
                                  "refuse": ["--refuse"]}[mode])
@@ -51,6 +53,7 @@ class Sharing:
                 break
             except Failure:
                 self._phone.programs.remove(self._service)
+                self._service = None
                 if port == "0":
                     raise
         self.url = line.partition("ready: ")[2].strip()

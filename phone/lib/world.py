@@ -1,6 +1,5 @@
 """The world around the phone: network, orientation, signals, settings, account, contacts."""
 
-import os
 import shutil
 import sys
 
@@ -82,16 +81,18 @@ def service(state, args):
     link.ask(state, message)
 
 
-_CONTACT = ("phone contact add NAME NUMBER [PHOTO] | rename OLD NEW | remove NAME | list")
+_CONTACT = ("phone contact add NAME NUMBER [PHOTO] | import FILE | rename OLD NEW | remove NAME | "
+            "list")
+_CONTACT_WORDS = {"add": (2, 3), "import": (1, 1), "rename": (2, 2), "remove": (1, 1),
+                  "list": (0, 0)}
 
 
 def contact(state, args):
     words = parse(args, words=(1, 4), usage=_CONTACT).words
     what, *rest = words
-    least, most = {"add": (2, 3), "rename": (2, 2), "remove": (1, 1), "list": (0, 0)}.get(what,
-                                                                                         (9, 9))
+    least, most = _CONTACT_WORDS.get(what, (9, 9))
     if not least <= len(rest) <= most:
         raise Usage(f"'{' '.join(words)}' is not understood; {_CONTACT}")
-    if len(rest) == 3:
-        rest[2] = os.path.abspath(carry(state, rest[2]))
+    if what == "import" or len(rest) == 3:
+        rest[-1] = carry(state, rest[-1])
     return link.run(state, [state.tool("phone-contact"), what] + rest)

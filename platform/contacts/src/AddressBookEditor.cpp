@@ -53,6 +53,14 @@ bool fail(const OwnedError& failure, std::string& error) {
   return true;
 }
 
+bool store(EBookClient* book, GSList* contacts, std::string& error) {
+  const Deadline deadline(kPatience);
+  OwnedError failure;
+  e_book_client_add_contacts_sync(book, contacts, E_BOOK_OPERATION_FLAG_NONE, nullptr,
+                                  deadline.cancellable(), Out(failure));
+  return !fail(failure, error);
+}
+
 /// The contacts of exactly that name.
 OwnedContacts named(EBookClient* book, const std::string& name, std::string& error) {
   const Deadline deadline(kPatience);
@@ -91,11 +99,24 @@ bool AddressBookEditor::add(const std::vector<Entry>& entries, std::string& erro
     if (!setPicture(contact.get(), entry.picture, error)) return false;
     contacts.reset(g_slist_prepend(contacts.release(), contact.release()));
   }
-  const Deadline deadline(kPatience);
-  OwnedError failure;
-  e_book_client_add_contacts_sync(_d->book.get(), contacts.get(), E_BOOK_OPERATION_FLAG_NONE,
-                                  nullptr, deadline.cancellable(), Out(failure));
-  return !fail(failure, error);
+  return store(_d->book.get(), contacts.get(), error);
+}
+
+bool AddressBookEditor::import(const std::string& vcards, std::string& error) {
+  static const std::string kBegin = "BEGIN:VCARD";
+  OwnedContacts contacts;
+  size_t begin = vcards.find(kBegin);
+  while (begin != std::string::npos) {
+    const size_t next = vcards.find(kBegin, begin + kBegin.size());
+    EContact* contact = e_contact_new_from_vcard(vcards.substr(begin, next - begin).c_str());
+    if (contact) contacts.reset(g_slist_prepend(contacts.release(), contact));
+    begin = next;
+  }
+  if (!contacts) {
+    error = "there is no contact in the file";
+    return false;
+  }
+  return store(_d->book.get(), contacts.get(), error);
 }
 
 bool AddressBookEditor::rename(const std::string& from, const std::string& to, std::string& error) {

@@ -27,6 +27,8 @@ class AddressBookEditor {
   /// when it was not made.
   bool add(const Entry& entry, std::string& error);
   bool add(const std::vector<Entry>& entries, std::string& error);
+  /// All contacts of a vCard file's text.
+  bool import(const std::string& vcards, std::string& error);
   /// Every contact of that name.
   bool rename(const std::string& from, const std::string& to, std::string& error);
   bool remove(const std::string& name, std::string& error);

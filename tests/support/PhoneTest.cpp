@@ -1,0 +1,59 @@
+// The main program of phone tests: one phone for all tests of the program, a picture of the screen
+// for each test that fails.
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <memory>
+
+#include "Phone.h"
+
+namespace phone {
+namespace {
+
+std::unique_ptr<Phone>& current() {
+  static std::unique_ptr<Phone> phone;
+  return phone;
+}
+
+class PutAway : public testing::Environment {
+ public:
+  void TearDown() override {
+    if (!current()) return;
+    current()->command({"down"});
+    EXPECT_EQ(current()->sanitizerFindings(), "");
+    current().reset();
+  }
+};
+
+class Pictures : public testing::EmptyTestEventListener {
+  void OnTestEnd(const testing::TestInfo& test) override {
+    if (!test.result()->Failed() || !current() || !current()->isUp()) return;
+    const std::string folder = std::string(BUILD_DIR) + "/test-results";
+    std::filesystem::create_directories(folder);
+    const std::string file = folder + "/" + test.test_suite_name() + "." + test.name() + ".png";
+    if (current()->command({"screenshot", file}).status == 0) {
+      printf("the screen: %s\n", file.c_str());
+    }
+    printf("the viewer's log:\n%s\n", current()->command({"log"}).out.c_str());
+  }
+};
+
+}  // namespace
+
+Phone& thePhone() {
+  if (!current()) {
+    const auto program = std::filesystem::read_symlink("/proc/self/exe");
+    current() = std::make_unique<Phone>(program.filename().string());
+  }
+  return *current();
+}
+
+}  // namespace phone
+
+int main(int argc, char** argv) {
+  testing::InitGoogleTest(&argc, argv);
+  testing::AddGlobalTestEnvironment(new phone::PutAway);
+  testing::UnitTest::GetInstance()->listeners().Append(new phone::Pictures);
+  return RUN_ALL_TESTS();
+}

@@ -1,0 +1,169 @@
+#!/usr/bin/python3
+"""Runs the test programs of a build: unit tests inside one phone, phone tests outside, each with a
+phone of its own. Ends with "N passed, N failed"."""
+
+import argparse
+import json
+import os
+import re
+import signal
+import subprocess
+import sys
+import time
+
+ROOT = os.path.dirname(os.path.dirname(os.path.abspath(__file__)))
+PHONE = os.path.join(ROOT, "phone", "phone")
+PATIENCE = 300        # seconds for one program
+SANITIZER_FACTOR = 4  # how much slower programs may be under the sanitizers
+
+
+def arguments():
+    parser = argparse.ArgumentParser(prog="./test")
+    parser.add_argument("--sanitize", action="store_true", help="under ASan and UBSan")
+    parser.add_argument("--only", metavar="REGEX", type=re.compile, default=re.compile(""),
+                        help="tests or programs whose name matches")
+    return parser.parse_args()
+
+
+class Program:
+    """A test program of the build."""
+
+    def __init__(self, entry):
+        properties = {one["name"]: one["value"] for one in entry.get("properties", [])}
+        self.name = entry["name"]
+        self.path, *self.arguments = entry["command"]
+        self.outside = "phone" in properties.get("LABELS", [])
+        self.patience = properties.get("TIMEOUT", PATIENCE)
+
+
+class Result:
+    def __init__(self, passed=0, failed=0, skipped=0, output=""):
+        self.passed, self.failed, self.skipped, self.output = passed, failed, skipped, output
+
+    def __str__(self):
+        parts = [f"{self.passed} passed"]
+        if self.failed:
+            parts.append(f"{self.failed} FAILED")
+        if self.skipped:
+            parts.append(f"{self.skipped} skipped")
+        return ", ".join(parts)
+
+
+def programs(build):
+    listed = json.loads(subprocess.run(["ctest", "--show-only=json-v1"], cwd=build, check=True,
+                                       stdout=subprocess.PIPE).stdout)
+    return [Program(entry) for entry in listed["tests"] if entry.get("command")]
+
+
+class Runner:
+    def __init__(self, options):
+        self.only = options.only
+        self.factor = SANITIZER_FACTOR if options.sanitize else 1
+        self.build = os.path.join(ROOT, "build", "asan" if options.sanitize else "dev")
+        self.phone = os.path.join(self.build, "phones", "unit")
+        self.results = os.path.join(self.build, "test-results")
+        os.makedirs(self.results, exist_ok=True)
+        os.environ["PHONE_BUILD"] = self.build
+        suppressions = os.path.join(ROOT, "tests", "leaks.supp")
+        os.environ.setdefault("LSAN_OPTIONS", f"suppressions={suppressions}:print_suppressions=0")
+        os.environ.setdefault("UBSAN_OPTIONS", "print_stacktrace=1:halt_on_error=1")
+
+    def command(self, program, extra):
+        words = [program.path] + program.arguments + extra
+        return words if program.outside else [PHONE, "--state", self.phone, "shell"] + words
+
+    def filter(self, program):
+        """The arguments that choose the wanted tests; None when there are none."""
+        if self.only.search(program.name):
+            return []
+        listed = subprocess.run(self.command(program, ["--gtest_list_tests"]), text=True,
+                                stdout=subprocess.PIPE, stderr=subprocess.DEVNULL).stdout
+        suite, wanted = "", []
+        for line in listed.splitlines():
+            name = line.split("#")[0].strip()
+            if not line.startswith(" "):
+                suite = name
+            elif self.only.search(suite + name):
+                wanted.append(suite + name)
+        return ["--gtest_filter=" + ":".join(wanted)] if wanted else None
+
+    def run(self, program):
+        chosen = self.filter(program)
+        if chosen is None:
+            return None
+        report = os.path.join(self.results, program.name + ".json")
+        if os.path.exists(report):
+            os.unlink(report)
+        words = self.command(program, chosen + ["--gtest_output=json:" + report])
+        status, output = self.watch(words, float(program.patience) * self.factor)
+        return self.judge(report, status, output)
+
+    @staticmethod
+    def watch(words, patience):
+        process = subprocess.Popen(words, stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
+                                   stderr=subprocess.STDOUT, text=True, errors="replace",
+                                   start_new_session=True)
+        try:
+            output, _ = process.communicate(timeout=patience)
+            return process.returncode, output
+        except subprocess.TimeoutExpired:
+            os.killpg(process.pid, signal.SIGTERM)
+            output, _ = process.communicate()
+            return None, f"{output}\nended after {patience:.0f} s without a result"
+
+    @staticmethod
+    def judge(report, status, output):
+        try:
+            with open(report, encoding="utf-8") as file:
+                summary = json.load(file)
+        except (OSError, ValueError):
+            if status == 0 and "[==========]" not in output:
+                return Result(passed=1)  # a program that is one test
+            return Result(failed=1, output=output + f"\nended with status {status}")
+        cases = [case for suite in summary["testsuites"] for case in suite["testsuite"]]
+        failed = sum("failures" in case for case in cases)
+        skipped = sum(case["result"] == "SKIPPED" for case in cases)
+        ran = sum(case["status"] == "RUN" for case in cases)
+        if status != 0 and failed == 0:  # it broke on its way out
+            return Result(ran - skipped, 1, skipped, output + f"\nended with status {status}")
+        return Result(ran - failed - skipped, failed, skipped, output if failed else "")
+
+    def phone_command(self, *words):
+        return subprocess.run([PHONE, "--state", self.phone, *words]).returncode
+
+    def run_all(self):
+        total = Result()
+        wanted = programs(self.build)
+        inside = [program for program in wanted if not program.outside]
+        if inside:
+            if self.phone_command("up", "--headless") != 0:
+                return Result(failed=1)
+            try:
+                self.run_these(inside, total)
+            finally:
+                self.phone_command("down")
+        self.run_these([program for program in wanted if program.outside], total)
+        return total
+
+    def run_these(self, some, total):
+        for program in some:
+            begin = time.monotonic()
+            result = self.run(program)
+            if result is None:
+                continue
+            print(f"{program.name}: {result} ({time.monotonic() - begin:.1f} s)", flush=True)
+            if result.failed:
+                print(result.output.rstrip(), flush=True)
+            total.passed += result.passed
+            total.failed += result.failed
+
+
+def main():
+    options = arguments()
+    total = Runner(options).run_all()
+    print(f"{total.passed} passed, {total.failed} failed")
+    return 1 if total.failed or not total.passed else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())
