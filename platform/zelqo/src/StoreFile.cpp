@@ -13,6 +13,7 @@ namespace zelqo {
 namespace {
 
 constexpr mode_t kPrivate = 0700;
+constexpr mode_t kPrivateFile = 0600;
 
 constexpr char kSchema[] = R"(
 CREATE TABLE IF NOT EXISTS received(
@@ -41,7 +42,7 @@ CREATE TABLE IF NOT EXISTS account(
 class MoveLock {
  public:
   explicit MoveLock(const std::string& path)
-      : _fd(::open((path + ".lock").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0600)) {
+      : _fd(::open((path + ".lock").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, kPrivateFile)) {
     if (_fd >= 0) flock(_fd, LOCK_EX);
   }
   ~MoveLock() {
@@ -73,6 +74,9 @@ store::Database* StoreFile::database() {
 void StoreFile::open() {
   const base::OwnedText folder(g_path_get_dirname(_path.c_str()));
   g_mkdir_with_parents(folder.get(), kPrivate);
+  // The account's key lies in it; SQLite gives its other files the mode of this one.
+  const int fd = ::open(_path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, kPrivateFile);
+  if (fd >= 0) close(fd);
   _database = store::Database::open(_path, kSchema);
   struct stat status;
   if (!_database || stat(_path.c_str(), &status) != 0) return;
