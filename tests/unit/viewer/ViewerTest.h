@@ -17,6 +17,8 @@ using Errors = std::vector<std::string>;
 class ViewerTest : public testing::Test {
  protected:
   void SetUp() override {
+    // What the test before has started may run out.
+    FakeClock::advance(60);
     FakeLog::get().clear();
     FakePhone::get().reset();
     FakePlatform::get().reset();
