@@ -172,6 +172,7 @@ void DownloadManager::_finish(Download& download) {
   _index.set(download.url, path);
   download.path = path;
   download.received = sizeOnDisk(path);
+  download.size = download.received;
   download.etag.clear();
   download.state = State::Done;
   _store(download);

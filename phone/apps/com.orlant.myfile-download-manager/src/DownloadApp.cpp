@@ -10,6 +10,7 @@
 
 #include "DownloadPage.h"
 #include "DownloadRequest.h"
+#include "FileNamer.h"
 
 using companion::format;
 using companion::text;
@@ -27,13 +28,12 @@ DownloadManager::Folders folders() {
 }
 
 std::string doneText(int count, const std::string& lastName) {
-  if (count == 1) return format("%s downloaded", companion::singleLine(lastName).c_str());
+  if (count == 1) return format("%s downloaded", safeName(lastName).c_str());
   return format("%d files downloaded", count);
 }
 
 std::string failedText(int count, const std::string& lastName) {
-  if (count == 1)
-    return format("%s could not be downloaded", companion::singleLine(lastName).c_str());
+  if (count == 1) return format("%s could not be downloaded", safeName(lastName).c_str());
   return format("%d files could not be downloaded", count);
 }
 

@@ -4,6 +4,7 @@
 #include <companion/Text.h>
 
 #include "DownloadTexts.h"
+#include "FileNamer.h"
 #include "FolderView.h"
 
 using companion::text;
@@ -104,7 +105,7 @@ companion::Row DownloadPage::row(companion::RowKey key) {
   companion::Row row;
   const Download* download = _manager.find(key);
   if (!download) return row;
-  row.title = download->name;
+  row.title = safeName(download->name);
   row.detail = detailOf(*download, _manager.isHeldBack(*download));
   if (download->isPending()) {
     row.progress = download->size == 0 ? 0.0

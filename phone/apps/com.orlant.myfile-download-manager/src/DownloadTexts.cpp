@@ -54,7 +54,7 @@ std::string detailOf(const Download& download, bool isHeldBack) {
     case State::Running:
       return progressText(download);
     case State::Done:
-      return format("Downloaded, %s", sizeText(download.received).c_str());
+      return format("Downloaded, %s", sizeText(download.size).c_str());
     case State::Cancelled:
       return text("Cancelled");
     case State::Failed:

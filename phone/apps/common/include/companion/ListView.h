@@ -34,13 +34,11 @@ class ListView {
  private:
   struct Cell;
 
-  static char* _textGetCb(void* data, Evas_Object* list, const char* part);
   static Evas_Object* _contentGetCb(void* data, Evas_Object* list, const char* part);
   static void _selectedCb(void* data, Evas_Object* list, void* item);
   static void _deletedCb(void* data, Evas* canvas, Evas_Object* list, void* info);
 
   Elm_Genlist_Item_Class* _makeClass();
-  Evas_Object* _content(Cell& cell, const char* part);
   void _refresh(Cell& cell);
   void _name(const Cell& cell);
 
