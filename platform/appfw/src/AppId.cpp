@@ -12,8 +12,9 @@ std::string idFromPath(const std::string& path) {
   if (bin == std::string::npos || bin == 0) return {};
   const size_t id = path.rfind('/', bin - 1);
   constexpr size_t parent = sizeof "/apps" - 1;
-  if (id == std::string::npos || id < parent || path.compare(id - parent, parent, "/apps") != 0)
+  if (id == std::string::npos || id < parent || path.compare(id - parent, parent, "/apps") != 0) {
     return {};
+  }
   return path.substr(id + 1, bin - id - 1);
 }
 

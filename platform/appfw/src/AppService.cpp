@@ -25,8 +25,9 @@ GDBusInterfaceInfo* appInterface() {
 
 /// What the sender says about itself gives way to what the bus says.
 void setCaller(bundle& request, const Caller& caller, bool replyWanted) {
-  for (const char* key : {AUL_K_CALLER_PID, AUL_K_CALLER_APPID, AUL_K_WAIT_RESULT})
+  for (const char* key : {AUL_K_CALLER_PID, AUL_K_CALLER_APPID, AUL_K_WAIT_RESULT}) {
     request.remove(key);
+  }
   request.add(AUL_K_CALLER_PID, std::to_string(caller.pid));
   if (!caller.appId.empty()) request.add(AUL_K_CALLER_APPID, caller.appId);
   if (replyWanted) request.add(AUL_K_WAIT_RESULT, std::string("1"));
@@ -108,8 +109,9 @@ void AppService::deliverTo(RequestHandler handler) {
 }
 
 void AppService::deliverSoon() {
-  if (_handler && !_waiting.empty() && !_idle)
+  if (_handler && !_waiting.empty() && !_idle) {
     _idle = g_idle_add_full(G_PRIORITY_DEFAULT, deliverCb, this, nullptr);
+  }
 }
 
 gboolean AppService::deliverCb(void* data) {

@@ -14,8 +14,9 @@ GVariant* textsVariant(const keyval_t& entry) {
 
 bool add(bundle& target, const char* key, GVariant* value) {
   if (!*key) return false;
-  if (g_variant_is_of_type(value, G_VARIANT_TYPE_STRING))
+  if (g_variant_is_of_type(value, G_VARIANT_TYPE_STRING)) {
     return target.add(key, std::string(g_variant_get_string(value, nullptr)));
+  }
   if (!g_variant_is_of_type(value, G_VARIANT_TYPE_STRING_ARRAY)) return false;
   gsize count = 0;
   base::Owned<const char*, g_free> texts(g_variant_get_strv(value, &count));
@@ -47,9 +48,10 @@ OwnedBundle fromVariant(GVariant* contents) {
   const char* key = nullptr;
   GVariant* value = nullptr;
   while (g_variant_iter_loop(&entries, "{&sv}", &key, &value)) {
-    if (!add(*target, key, value))
+    if (!add(*target, key, value)) {
       dlog_print(DLOG_WARN, "APPFW", "bundle entry \"%s\" of type %s is left out", key,
                  g_variant_get_type_string(value));
+    }
   }
   return target;
 }

@@ -5,7 +5,7 @@
 
 namespace appfw {
 
-constexpr size_t kMaxBundleBytes = 1024 * 1024;
+constexpr size_t kMaxBundleBytes = size_t{1024} * 1024;
 
 /// A floating reference. What is not UTF-8 gets replacement characters: the bus takes nothing else.
 GVariant* toVariant(const bundle& contents);

@@ -3,8 +3,6 @@
 namespace appfw {
 namespace {
 
-using base::Out;
-using base::OwnedError;
 using base::OwnedVariant;
 
 constexpr std::string_view kPrefix = "phoneapp.i";
@@ -64,8 +62,9 @@ std::string appIdOfBusName(const std::string& name) {
       id += name[i];
       continue;
     }
-    if (i + 2 >= name.size() || !g_ascii_isxdigit(name[i + 1]) || !g_ascii_isxdigit(name[i + 2]))
+    if (i + 2 >= name.size() || !g_ascii_isxdigit(name[i + 1]) || !g_ascii_isxdigit(name[i + 2])) {
       return {};
+    }
     id += static_cast<char>(g_ascii_xdigit_value(name[i + 1]) * 16 +
                             g_ascii_xdigit_value(name[i + 2]));
     i += 2;

@@ -16,10 +16,11 @@ using OwnedBuilder = base::Owned<JsonBuilder, g_object_unref>;
 
 void addMember(JsonBuilder* builder, const char* name, const std::string& value) {
   json_builder_set_member_name(builder, name);
-  if (value.empty())
+  if (value.empty()) {
     json_builder_add_null_value(builder);
-  else
+  } else {
     json_builder_add_string_value(builder, utf8(value).c_str());
+  }
 }
 
 void addExtra(JsonBuilder* builder, const keyval_t& extra) {
@@ -46,8 +47,9 @@ std::string line(const bundle& request) {
   addMember(builder.get(), "launch_mode", textOf(request, kKeyLaunchMode));
   json_builder_set_member_name(builder.get(), "extras");
   json_builder_begin_array(builder.get());
-  for (const auto& entry : request.entries)
+  for (const auto& entry : request.entries) {
     if (!isSystemKey(entry.key)) addExtra(builder.get(), entry);
+  }
   json_builder_end_array(builder.get());
   json_builder_end_object(builder.get());
 

@@ -107,10 +107,11 @@ void PendingLaunch::sent(GDBusMessage* answer, const GError* error) {
 
 void PendingLaunch::delivered(const char* callee) {
   _callee = callee ? callee : "";
-  if (_events.onReply)
+  if (_events.onReply) {
     _watch =
         g_bus_watch_name_on_connection(_bus.get(), _callee.c_str(), G_BUS_NAME_WATCHER_FLAGS_NONE,
                                        nullptr, vanishedCb, this, nullptr);
+  }
   const bool replyWanted = static_cast<bool>(_events.onReply);
   if (_events.onDelivered) _events.onDelivered(true);
   if (!replyWanted) delete this;

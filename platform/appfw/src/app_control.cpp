@@ -45,10 +45,11 @@ const keyval_t* findExtra(app_control_h app_control, const char* key, bool array
   error = checkKey(app_control, key);
   if (error != APP_CONTROL_ERROR_NONE) return nullptr;
   const keyval_t* entry = app_control->data->find(key);
-  if (!entry)
+  if (!entry) {
     error = APP_CONTROL_ERROR_KEY_NOT_FOUND;
-  else if (entry->isArray() != array)
+  } else if (entry->isArray() != array) {
     error = APP_CONTROL_ERROR_INVALID_DATA_TYPE;
+  }
   return error == APP_CONTROL_ERROR_NONE ? entry : nullptr;
 }
 
@@ -200,25 +201,29 @@ int app_control_foreach_extra_data(app_control_h app_control, app_control_extra_
                                    void* user_data) {
   if (!app_control || !callback) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   std::vector<std::string> keys;  // the callback may change the request
-  for (const auto& entry : app_control->data->entries)
+  for (const auto& entry : app_control->data->entries) {
     if (!isSystemKey(entry.key)) keys.push_back(entry.key);
-  for (const auto& key : keys)
+  }
+  for (const auto& key : keys) {
     if (!callback(app_control, key.c_str(), user_data)) break;
+  }
   return APP_CONTROL_ERROR_NONE;
 }
 
 int app_control_get_caller(app_control_h app_control, char** id) {
   if (!id) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *id = nullptr;
-  if (!app_control || app_control->kind != app_control_s::Kind::Received)
+  if (!app_control || app_control->kind != app_control_s::Kind::Received) {
     return APP_CONTROL_ERROR_INVALID_PARAMETER;
+  }
   const char* caller = bundle_get_val(app_control->data.get(), AUL_K_CALLER_APPID);
   return caller ? copyText(caller, id) : APP_CONTROL_ERROR_KEY_NOT_FOUND;
 }
 
 int app_control_is_reply_requested(app_control_h app_control, bool* requested) {
-  if (!app_control || !requested || app_control->kind != app_control_s::Kind::Received)
+  if (!app_control || !requested || app_control->kind != app_control_s::Kind::Received) {
     return APP_CONTROL_ERROR_INVALID_PARAMETER;
+  }
   *requested = app_control->data->find(AUL_K_WAIT_RESULT) != nullptr;
   return APP_CONTROL_ERROR_NONE;
 }

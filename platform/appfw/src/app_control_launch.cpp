@@ -19,7 +19,7 @@ constexpr const char* kResolver = "com.orlant.resolver";
 
 /// Empty when the request names no application and nobody can find one for it.
 std::string targetOf(const bundle& request) {
-  const std::string appId = textOf(request, kKeyAppId);
+  std::string appId = textOf(request, kKeyAppId);
   if (!appId.empty()) return appId;
   const bool findable = textOf(request, kKeyOperation) == APP_CONTROL_OPERATION_VIEW &&
                         mime::resolver_can_open(textOf(request, kKeyUri).c_str());
@@ -74,13 +74,15 @@ int app_control_reply_to_launch_request(app_control_h reply, app_control_h reque
                                         app_control_result_e result) {
   const bool known = result == APP_CONTROL_RESULT_SUCCEEDED ||
                      result == APP_CONTROL_RESULT_FAILED || result == APP_CONTROL_RESULT_CANCELED;
-  if (!reply || !request || request->replyPath.empty() || !known)
+  if (!reply || !request || request->replyPath.empty() || !known) {
     return APP_CONTROL_ERROR_INVALID_PARAMETER;
+  }
   base::OwnedBus bus = base::sessionBus();
   if (!bus) return APP_CONTROL_ERROR_LAUNCH_FAILED;
   base::OwnedVariant contents(g_variant_ref_sink(appfw::toVariant(*reply->data)));
-  if (g_variant_get_size(contents.get()) > appfw::kMaxBundleBytes)
+  if (g_variant_get_size(contents.get()) > appfw::kMaxBundleBytes) {
     return APP_CONTROL_ERROR_LAUNCH_REJECTED;
+  }
   g_dbus_connection_call(bus.get(), request->replyTo.c_str(), request->replyPath.c_str(),
                          appfw::kReplyInterface, "Reply",
                          g_variant_new("(i@a{sv})", result, contents.get()), nullptr,

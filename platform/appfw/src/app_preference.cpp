@@ -49,7 +49,8 @@ int preference_foreach_item(preference_item_cb callback, void* user_data) {
   if (!callback) return PREFERENCE_ERROR_INVALID_PARAMETER;
   std::vector<std::string> keys;
   const int error = ownStore().keys(keys);
-  for (const auto& key : keys)
+  for (const auto& key : keys) {
     if (!callback(key.c_str(), user_data)) break;
+  }
   return error;
 }

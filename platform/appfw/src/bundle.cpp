@@ -25,12 +25,13 @@ const keyval_t* findOfType(const bundle* b, const char* key, int type) {
     return nullptr;
   }
   const keyval_t* entry = b->find(key);
-  if (!entry)
+  if (!entry) {
     set_last_result(BUNDLE_ERROR_KEY_NOT_AVAILABLE);
-  else if (entry->type != type)
+  } else if (entry->type != type) {
     set_last_result(BUNDLE_ERROR_INVALID_PARAMETER);
-  else
+  } else {
     set_last_result(BUNDLE_ERROR_NONE);
+  }
   return entry && entry->type == type ? entry : nullptr;
 }
 
@@ -65,10 +66,11 @@ void _bundle_t::copyFrom(const _bundle_t& other) {
   if (this == &other) return;
   entries.clear();
   for (const auto& entry : other.entries) {
-    if (entry.isArray())
+    if (entry.isArray()) {
       entries.emplace_back(entry.key, entry.texts);
-    else
+    } else {
       entries.emplace_back(entry.key, entry.text);
+    }
   }
 }
 
@@ -103,9 +105,11 @@ int bundle_add(bundle* b, const char* key, const char* val) {
 }
 
 int bundle_add_str_array(bundle* b, const char* key, const char** str_array, const int len) {
-  if (!b || !isText(key) || len < 0 || (len > 0 && !str_array))
+  if (!b || !isText(key) || len < 0 || (len > 0 && !str_array)) {
     return BUNDLE_ERROR_INVALID_PARAMETER;
+  }
   std::vector<std::string> texts;
+  texts.reserve(static_cast<size_t>(len));
   for (int i = 0; i < len; i++) texts.emplace_back(str_array[i] ? str_array[i] : "");
   return b->add(key, std::move(texts)) ? BUNDLE_ERROR_NONE : BUNDLE_ERROR_KEY_EXISTS;
 }
@@ -169,8 +173,9 @@ int bundle_encode(bundle* b, bundle_raw** r, int* len) {
 
 bundle* bundle_decode(const bundle_raw* r, const int len) {
   set_last_result(BUNDLE_ERROR_INVALID_PARAMETER);
-  if (!r || len < static_cast<int>(kMagic.size()) || memcmp(r, kMagic.data(), kMagic.size()) != 0)
+  if (!r || len < static_cast<int>(kMagic.size()) || memcmp(r, kMagic.data(), kMagic.size()) != 0) {
     return nullptr;
+  }
   base::Owned<GBytes, g_bytes_unref> bytes(
       g_bytes_new(r + kMagic.size(), static_cast<size_t>(len) - kMagic.size()));
   OwnedVariant contents(

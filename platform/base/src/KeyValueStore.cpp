@@ -70,9 +70,11 @@ int KeyValueStore::moveAsideIfDamaged() {
   if (!damaged(code)) return code;
   dlog_print(DLOG_ERROR, kTag, "%s is damaged; it becomes .corrupt and a new one is begun",
              _path.c_str());
-  for (const char* part : {"", "-wal", "-shm"})
-    if (rename((_path + part).c_str(), (_path + ".corrupt" + part).c_str()) != 0 && !*part)
+  for (const char* part : {"", "-wal", "-shm"}) {
+    if (rename((_path + part).c_str(), (_path + ".corrupt" + part).c_str()) != 0 && !*part) {
       return SQLITE_CANTOPEN;
+    }
+  }
   return SQLITE_OK;
 }
 

@@ -99,10 +99,11 @@ int StoreConnection::get(const std::string& key, KeyValueStore::Value& value) {
   use.bind(1, key);
   const int code = use.step();
   if (code != SQLITE_ROW) return code;
-  if (sqlite3_column_type(_get.get(), 0) == SQLITE_INTEGER)
+  if (sqlite3_column_type(_get.get(), 0) == SQLITE_INTEGER) {
     value = static_cast<int64_t>(sqlite3_column_int64(_get.get(), 0));
-  else
+  } else {
     value = columnText(_get.get(), 0);
+  }
   return code;
 }
 

@@ -8,14 +8,15 @@ thread_local int lastResult = TIZEN_ERROR_NONE;
 
 char* get_error_message(int err) {
   const char* text = "Unknown error";
-  if (err == TIZEN_ERROR_NONE)
+  if (err == TIZEN_ERROR_NONE) {
     text = "Successful";
-  else if (err == TIZEN_ERROR_TIMED_OUT)
+  } else if (err == TIZEN_ERROR_TIMED_OUT) {
     text = "Time out";
-  else if (err == TIZEN_ERROR_NOT_SUPPORTED)
+  } else if (err == TIZEN_ERROR_NOT_SUPPORTED) {
     text = "Not supported";
-  else if (err < 0 && err > -4096)
+  } else if (err < 0 && err > -4096) {
     text = strerrordesc_np(-err);
+  }
   return const_cast<char*>(text ? text : "Unknown error");
 }
 

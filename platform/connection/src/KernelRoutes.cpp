@@ -31,8 +31,9 @@ Route defaultRoute4(const std::string& root) {
     unsigned flags = 0, references = 0, uses = 0, metric = 0;
     columns >> interface >> destination >> gateway >> std::hex >> flags >> std::dec >> references >>
         uses >> metric >> mask;
-    if (columns && destination == "00000000" && mask == "00000000")
+    if (columns && destination == "00000000" && mask == "00000000") {
       keepBetter(best, interface, flags, metric);
+    }
   }
   return best;
 }
@@ -47,8 +48,9 @@ Route defaultRoute6(const std::string& root) {
     unsigned metric = 0, references = 0, uses = 0, flags = 0;
     columns >> destination >> length >> source >> sourceLength >> gateway >> std::hex >> metric >>
         references >> uses >> flags >> interface;
-    if (columns && length == "00" && destination.find_first_not_of('0') == std::string::npos)
+    if (columns && length == "00" && destination.find_first_not_of('0') == std::string::npos) {
       keepBetter(best, interface, flags, metric);
+    }
   }
   return best;
 }
@@ -64,10 +66,12 @@ connection_type_e typeOfInterface(const std::string& folder) {
   constexpr int pointToPoint = 512;
   const std::string event = contents(folder + "/uevent");
   const auto is = [&event](const char* type) { return event.find(type) != std::string::npos; };
-  if (access((folder + "/phy80211").c_str(), F_OK) == 0 || is("DEVTYPE=wlan"))
+  if (access((folder + "/phy80211").c_str(), F_OK) == 0 || is("DEVTYPE=wlan")) {
     return CONNECTION_TYPE_WIFI;
-  if (is("DEVTYPE=wwan") || contents(folder + "/type") == std::to_string(pointToPoint) + '\n')
+  }
+  if (is("DEVTYPE=wwan") || contents(folder + "/type") == std::to_string(pointToPoint) + '\n') {
     return CONNECTION_TYPE_CELLULAR;
+  }
   if (is("DEVTYPE=bluetooth")) return CONNECTION_TYPE_BT;
   // Also for tunnels and the like: they are a connection.
   return CONNECTION_TYPE_ETHERNET;

@@ -29,8 +29,9 @@ class Objects {
         g_variant_new("(s)", interface), G_VARIANT_TYPE("(a{sv})"), G_DBUS_CALL_FLAGS_NO_AUTO_START,
         static_cast<int>(std::max<gint64>(left, 1)), nullptr, Out(error)));
     if (!answer) {
-      if (g_error_matches(error.get(), G_IO_ERROR, G_IO_ERROR_TIMED_OUT))
+      if (g_error_matches(error.get(), G_IO_ERROR, G_IO_ERROR_TIMED_OUT)) {
         dlog_print(DLOG_WARN, "CONNECTION", "NetworkManager does not answer");
+      }
       return nullptr;
     }
     return OwnedVariant(g_variant_get_child_value(answer.get(), 0));

@@ -47,8 +47,9 @@ bool toJournal(log_priority prio, const char* tag, const char* message) {
 
 int toStderr(const std::string& line) {
   ssize_t written = -1;
-  do written = write(STDERR_FILENO, line.data(), line.size());
-  while (written < 0 && errno == EINTR);
+  do {
+    written = write(STDERR_FILENO, line.data(), line.size());
+  } while (written < 0 && errno == EINTR);
   return written < 0 ? -errno : static_cast<int>(written);
 }
 

@@ -15,9 +15,10 @@ void notify(GDBusConnection* bus, const Message& message, GAsyncReadyCallback ca
     g_variant_builder_add(&actions, "s", "default");
     g_variant_builder_add(&actions, "s", "");
   }
-  if (message.stackTag)
+  if (message.stackTag) {
     g_variant_builder_add(&hints, "{sv}", "x-dunst-stack-tag",
                           g_variant_new_string(message.stackTag));
+  }
   g_dbus_connection_call(bus, kService, kPath, kService, "Notify",
                          g_variant_new("(susssasa{sv}i)", "phone", message.replaces, "", "",
                                        body.get(), &actions, &hints, message.timeoutMs),
@@ -30,10 +31,11 @@ unsigned finishNotify(GObject* bus, GAsyncResult* result) {
   base::OwnedVariant answer(
       g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, base::Out(error)));
   guint32 number = 0;
-  if (answer)
+  if (answer) {
     g_variant_get(answer.get(), "(u)", &number);
-  else
+  } else {
     dlog_print(DLOG_ERROR, "NOTIFICATION", "no message shown: %s", error->message);
+  }
   return number;
 }
 

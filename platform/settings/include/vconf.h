@@ -8,7 +8,7 @@ extern "C" {
 #endif
 
 #define VCONF_OK 0
-#define VCONF_ERROR -1
+#define VCONF_ERROR (-1)
 
 typedef struct _keynode_t keynode_t;
 /// On the main loop, after the value has changed in whichever process.

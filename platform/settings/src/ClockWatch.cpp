@@ -12,10 +12,11 @@
 
 ClockWatch::ClockWatch(std::function<void()> onSet)
     : _onSet(std::move(onSet)), _timer(timerfd_create(CLOCK_REALTIME, TFD_NONBLOCK | TFD_CLOEXEC)) {
-  if (arm())
+  if (arm()) {
     _source = g_unix_fd_add(_timer, G_IO_IN, readableCb, this);
-  else
+  } else {
     dlog_print(DLOG_WARN, "SETTINGS", "clock changes go unnoticed: %s", strerror(errno));
+  }
 }
 
 ClockWatch::~ClockWatch() {

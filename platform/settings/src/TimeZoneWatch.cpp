@@ -59,10 +59,11 @@ void TimeZoneWatch::changedCb(GDBusConnection*, const char*, const char*, const 
   auto* self = static_cast<TimeZoneWatch*>(data);
   base::OwnedVariant changed(g_variant_get_child_value(arguments, 1));
   const char* zone = nullptr;
-  if (g_variant_lookup(changed.get(), kZone, "&s", &zone))
+  if (g_variant_lookup(changed.get(), kZone, "&s", &zone)) {
     self->apply(zone);
-  else
+  } else {
     self->ask();
+  }
 }
 
 void TimeZoneWatch::ask() {
@@ -79,8 +80,9 @@ void TimeZoneWatch::answeredCb(GObject* bus, GAsyncResult* result, void* data) {
   GVariant* boxed = nullptr;
   g_variant_get(answer.get(), "(v)", &boxed);
   base::OwnedVariant zone(boxed);
-  if (g_variant_is_of_type(boxed, G_VARIANT_TYPE_STRING))
+  if (g_variant_is_of_type(boxed, G_VARIANT_TYPE_STRING)) {
     static_cast<TimeZoneWatch*>(data)->apply(g_variant_get_string(boxed, nullptr));
+  }
 }
 
 void TimeZoneWatch::apply(const std::string& zone) {

@@ -21,10 +21,11 @@ void VconfChanges::announce(const std::string& key) {
 }
 
 void VconfChanges::add(const std::string& key, vconf_callback_fn callback, void* data) {
-  if (!_subscription)
+  if (!_subscription) {
     _subscription = std::make_unique<base::SignalSubscription>(
         base::sessionBus(), base::SignalSubscription::Match{nullptr, kInterface, kSignal, kPath},
         changedCb, this);
+  }
   _listeners.push_back(std::make_shared<Listener>(Listener{key, callback, data}));
 }
 
@@ -51,6 +52,7 @@ void VconfChanges::changedCb(GDBusConnection*, const char*, const char*, const c
 void VconfChanges::changed(const std::string& key) {
   const auto listeners = _listeners;
   keynode_t node{key};
-  for (const auto& listener : listeners)
+  for (const auto& listener : listeners) {
     if (!listener->removed && listener->key == key) listener->callback(&node, listener->data);
+  }
 }

@@ -5,12 +5,12 @@
 
 #include <vconf.h>
 
-#include <cstdint>
 #include <cstdlib>
 #include <cstring>
 #include <map>
 #include <memory>
 #include <string>
+#include <string_view>
 
 namespace {
 
@@ -58,10 +58,6 @@ bool isLocale(system_settings_key_e key) {
   return key == SYSTEM_SETTINGS_KEY_LOCALE_COUNTRY || key == SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE;
 }
 
-void* asData(system_settings_key_e key) {
-  return reinterpret_cast<void*>(static_cast<intptr_t>(key));
-}
-
 void fire(system_settings_key_e key) {
   const auto listener = listeners().find(key);
   if (listener == listeners().end()) return;
@@ -69,8 +65,12 @@ void fire(system_settings_key_e key) {
   called.callback(key, called.data);
 }
 
-void vconfChangedCb(keynode_t*, void* data) {
-  fire(static_cast<system_settings_key_e>(reinterpret_cast<intptr_t>(data)));
+void vconfChangedCb(keynode_t* node, void*) {
+  const std::string_view changed = vconf_keynode_get_name(node);
+  for (const auto key : {SYSTEM_SETTINGS_KEY_LOCALE_COUNTRY, SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE,
+                         SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR}) {
+    if (changed == vconfKey(key)) fire(key);
+  }
 }
 
 TimeWatch::TimeWatch()
@@ -95,7 +95,7 @@ std::string localeFromEnvironment(const char* category) {
 std::string localeOf(system_settings_key_e key) {
   char* stored = vconf_get_str(vconfKey(key));
   const bool language = key == SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE;
-  const std::string locale =
+  std::string locale =
       stored ? stored : localeFromEnvironment(language ? "LC_MESSAGES" : "LC_TIME");
   free(stored);
   return locale;
@@ -109,7 +109,7 @@ int system_settings_set_changed_cb(system_settings_key_e key, system_settings_ch
   const char* stored = vconfKey(key);
   if (!stored && !isTime(key)) return SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED;
   const bool first = listeners().insert_or_assign(key, Listener{callback, user_data}).second;
-  if (first && stored) vconf_notify_key_changed(stored, vconfChangedCb, asData(key));
+  if (first && stored) vconf_notify_key_changed(stored, vconfChangedCb, nullptr);
   if (isTime(key) && !timeWatch()) timeWatch() = std::make_unique<TimeWatch>();
   return SYSTEM_SETTINGS_ERROR_NONE;
 }
@@ -126,8 +126,9 @@ int system_settings_unset_changed_cb(system_settings_key_e key) {
 int system_settings_get_value_string(system_settings_key_e key, char** value) {
   if (!value) return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
   *value = nullptr;
-  if (!isLocale(key) && key != SYSTEM_SETTINGS_KEY_LOCALE_TIMEZONE)
+  if (!isLocale(key) && key != SYSTEM_SETTINGS_KEY_LOCALE_TIMEZONE) {
     return SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED;
+  }
   const std::string text = isLocale(key) ? localeOf(key) : TimeZoneWatch::current();
   *value = strdup(text.c_str());
   return *value ? SYSTEM_SETTINGS_ERROR_NONE : SYSTEM_SETTINGS_ERROR_OUT_OF_MEMORY;
@@ -135,8 +136,9 @@ int system_settings_get_value_string(system_settings_key_e key, char** value) {
 
 int system_settings_get_value_bool(system_settings_key_e key, bool* value) {
   if (!value) return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
-  if (key != SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR)
+  if (key != SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR) {
     return SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED;
+  }
   int format = VCONFKEY_TIME_FORMAT_12;
   vconf_get_int(VCONFKEY_REGIONFORMAT_TIME1224, &format);
   *value = format == VCONFKEY_TIME_FORMAT_24;
@@ -151,8 +153,9 @@ int system_settings_set_value_string(system_settings_key_e key, const char* valu
 }
 
 int system_settings_set_value_bool(system_settings_key_e key, bool value) {
-  if (key != SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR)
+  if (key != SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR) {
     return SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED;
+  }
   const int format = value ? VCONFKEY_TIME_FORMAT_24 : VCONFKEY_TIME_FORMAT_12;
   return vconf_set_int(VCONFKEY_REGIONFORMAT_TIME1224, format) == VCONF_OK
              ? SYSTEM_SETTINGS_ERROR_NONE

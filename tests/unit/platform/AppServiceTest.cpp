@@ -51,8 +51,9 @@ class AnAppService : public testing::Test {
 }  // namespace
 
 TEST_F(AnAppService, DeliversEarlyRequestsInOrderOnceItIsReady) {
-  for (const char* text : {"{'n': <'1'>}", "{'n': <'2'>}", "{'n': <'3'>}"})
+  for (const char* text : {"{'n': <'1'>}", "{'n': <'2'>}", "{'n': <'3'>}"}) {
     EXPECT_TRUE(_stranger.launch(parse(text)));
+  }
   EXPECT_EQ(_received.count(), 0u);
   _received.start();
   ASSERT_TRUE(_received.waitFor(3));

@@ -167,8 +167,9 @@ TEST_F(Bundle, SurvivesEveryCutAndEveryFlippedByteOfItsBytes) {
         nullptr);
     bundle_free(back);
   };
-  for (size_t length = 0; length < bytes.size(); length++)
+  for (size_t length = 0; length < bytes.size(); length++) {
     decodeAndUse({bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length)});
+  }
   for (size_t i = 0; i < bytes.size(); i++) {
     for (const int flip : {0x01, 0x80, 0xff}) {
       auto broken = bytes;

@@ -38,8 +38,9 @@ GDBusMessage* FakeNetworkManager::filterCb(GDBusConnection* bus, GDBusMessage* m
 
 GDBusMessage* FakeNetworkManager::answer(GDBusMessage* question) {
   const auto object = _objects.find(g_dbus_message_get_path(question));
-  if (object == _objects.end())
+  if (object == _objects.end()) {
     return g_dbus_message_new_method_error_literal(question, "test.NoSuchObject", "none");
+  }
   GDBusMessage* answer = g_dbus_message_new_method_reply(question);
   GVariant* properties =
       g_variant_parse(G_VARIANT_TYPE_VARDICT, object->second.c_str(), nullptr, nullptr, nullptr);

@@ -48,8 +48,9 @@ class ALaunch : public testing::Test {
     self->_requestSeen = ReceivedRequests::extra(request, "do");
     self->_replyKeys = ReceivedRequests::extraKeys(reply);
     self->_reply.clear();
-    for (const auto& key : self->_replyKeys)
+    for (const auto& key : self->_replyKeys) {
       self->_reply[key] = ReceivedRequests::extra(reply, key.c_str());
+    }
   }
 
   int send(const char* task) {

@@ -127,13 +127,15 @@ TEST_F(Preferences, StopListingWhenToldSo) {
 TEST(PreferenceStores, LoseNothingWithManyWritersThatMakeTheFileTogether) {
   constexpr int writers = 6, each = 200;
   std::vector<pid_t> children;
-  for (int writer = 0; writer < writers; writer++)
+  for (int writer = 0; writer < writers; writer++) {
     children.push_back(inProcess([writer] {
       PreferenceStore store("test.crowd");
-      for (int i = 0; i < each; i++)
+      for (int i = 0; i < each; i++) {
         if (store.setText(std::to_string(writer) + "/" + std::to_string(i), "v") != 0) return 1;
+      }
       return 0;
     }));
+  }
   for (const pid_t child : children) EXPECT_EQ(exitStatus(child), 0);
   std::vector<std::string> keys;
   EXPECT_EQ(PreferenceStore("test.crowd").keys(keys), PREFERENCE_ERROR_NONE);

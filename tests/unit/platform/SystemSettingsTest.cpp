@@ -105,8 +105,9 @@ TEST_F(SystemSettings, ReportTheZoneBeforeTheTime) {
 TEST_F(SystemSettings, IgnoreZonesThatAreNone) {
   FakeTimeService service;
   system_settings_set_changed_cb(kTime, heardCb, &_heard);
-  for (const char* zone : {"", "../../etc/passwd", ":/etc/passwd", "A B", "UTC"})
+  for (const char* zone : {"", "../../etc/passwd", ":/etc/passwd", "A B", "UTC"}) {
     service.announce(zone);
+  }
   service.emit(g_variant_new("(i)", 7));
   service.announce("Asia/Tokyo");
   EXPECT_TRUE(waitFor({16}));

@@ -3,7 +3,6 @@
 #include <signal.h>
 #include <sys/prctl.h>
 #include <sys/wait.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <cstdlib>
@@ -61,8 +60,9 @@ void TestPhone::SetUp() {
                 "<allow send_destination=\"*\" eavesdrop=\"true\"/><allow "
                 "eavesdrop=\"true\"/></policy></busconfig>");
   _bus = startBus(config);
-  for (const auto& bus : {base::sessionBus().release(), base::systemBus().release()})
+  for (const auto& bus : {base::sessionBus().release(), base::systemBus().release()}) {
     g_dbus_connection_set_exit_on_close(bus, FALSE);
+  }
 }
 
 void TestPhone::TearDown() {

@@ -41,8 +41,9 @@ void setElsewhere(const char* key, const char* value) {
 class Vconf : public testing::Test {
  protected:
   ~Vconf() override {
-    for (const auto callback : {firstCb, secondCb, removingCb})
+    for (const auto callback : {firstCb, secondCb, removingCb}) {
       vconf_ignore_key_changed("test/key", callback);
+    }
   }
   Heard _heard;
 };

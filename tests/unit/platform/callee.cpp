@@ -83,8 +83,9 @@ int main(int argc, char** argv) {
   const std::string mode = argc > 2 ? argv[2] : "";
   const bool first = argc > 1 && isFirstStart(argv[1]);
   base::OwnedBus bus = base::sessionBus();
-  if (mode == "--quitting" && first)
+  if (mode == "--quitting" && first) {
     g_dbus_connection_add_filter(bus.get(), dieOnLaunch, nullptr, nullptr);
+  }
   GMainLoop* loop = g_main_loop_new(nullptr, FALSE);
   appfw::AppService service(appfw::applicationId());
   if (!service.start([loop] { g_main_loop_quit(loop); })) return 3;

@@ -12,7 +12,7 @@ namespace appfw {
 /// All calls answer one of preference_error_e.
 class PreferenceStore {
  public:
-  static constexpr size_t kMaxBytes = 64 * 1024;
+  static constexpr size_t kMaxBytes = size_t{64} * 1024;
 
   explicit PreferenceStore(const std::string& appId);
 
