@@ -38,6 +38,7 @@ Evas_Object* makeButton(Evas_Object* parent, const char* style, const std::strin
 // Shows only: the row that holds it is what one taps.
 Evas_Object* makeCheck(Evas_Object* parent, bool on, const std::string& name) {
   Evas_Object* check = elm_check_add(parent);
+  elm_object_style_set(check, "list");
   elm_check_state_set(check, on);
   evas_object_pass_events_set(check, EINA_TRUE);
   setAccessibleName(check, name);

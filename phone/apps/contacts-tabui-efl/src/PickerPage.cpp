@@ -51,7 +51,7 @@ void PickerPage::onRowTapped(companion::RowKey key) {
   if (_selected.erase(number) == 0) {
     if (_selected.size() >= _request.maxContacts) {
       companion::showMessage(
-          format("At most %d recipients", static_cast<int>(_request.maxContacts)));
+          format("No more than %d at once", static_cast<int>(_request.maxContacts)));
       return;
     }
     _selected.insert(number);
