@@ -64,7 +64,7 @@ Elm_Object_Item* ZQVExpiredView::onPushToNaviframe(Evas_Object* naviframe) {
   Evas_Object* back = elm_button_add(naviframe);
   elm_object_style_set(back, "naviframe/end_btn/default");
   evas_object_smart_callback_add(back, "clicked", _backTitleButtonPressedCb, this);
-  zqvSetAccessibleName(back, zqvText("back"));
+  zqvSetAccessibleName(back, zqvText("Back"));
   return elm_naviframe_item_push(naviframe, getTitle(), back, nullptr, getEvasObj(), nullptr);
 }
 

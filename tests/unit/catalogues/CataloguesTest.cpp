@@ -190,6 +190,15 @@ TEST_P(Catalogue, NamesTheSameButtonAlikeInBothDomains) {
   }
 }
 
+/// What a screen reader says of a file; the English words are their own identifiers.
+TEST_P(Catalogue, HasTheWordsOfTheScreenReader) {
+  const bool english = strcmp(GetParam(), "en") == 0;
+  for (const char* word : {"Back", "file", "missing", "on this phone", "requested", "downloading",
+                           "downloaded", "not downloaded", "selected"}) {
+    EXPECT_EQ(text(word) == word, english) << word;
+  }
+}
+
 INSTANTIATE_TEST_SUITE_P(Languages, Catalogue, testing::ValuesIn(kLanguages),
                          [](const auto& info) { return info.param; });
 
