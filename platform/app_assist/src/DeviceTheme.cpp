@@ -40,6 +40,23 @@ void setColour(const char* name, const char* palette) {
   edje_color_class_set(name, r, g, b, a, 0, 0, 0, 0, 0, 0, 0, 0);
 }
 
+/// Percent, as the accessibility settings have it.
+int textSize() {
+  int percent = 100;
+  vconf_get_int(kTextSizeKey, &percent);
+  return std::clamp(percent, 80, 200);
+}
+
+void setTextSize(int percent) {
+  for (const char* name : kScaledTexts) edje_text_class_set(name, nullptr, -percent);
+}
+
+/// Whoever uses the keyboard sees where it is; a touch hides that again.
+void followKeyboard() {
+  elm_config_window_auto_focus_enable_set(EINA_TRUE);
+  elm_config_first_item_focus_on_first_focusin_set(EINA_TRUE);
+}
+
 }  // namespace
 
 std::string DeviceTheme::path() {
@@ -56,7 +73,7 @@ bool DeviceTheme::install() {
   elm_theme_overlay_add(nullptr, file.c_str());
   applyScale();
   applyPalette();
-  applyTextSize();
+  followKeyboard();
   return true;
 }
 
@@ -68,13 +85,13 @@ void DeviceTheme::applyPalette() {
   for (char** name = list.get(); *name; name++) {
     if (**name) setColour(*name, palette);
   }
+  // The toolkit takes the colours of a text's style up again only with a new size.
+  setTextSize(textSize() + 1);
+  applyTextSize();
 }
 
 void DeviceTheme::applyTextSize() {
-  int percent = 100;
-  vconf_get_int(kTextSizeKey, &percent);
-  percent = std::clamp(percent, 80, 200);
-  for (const char* name : kScaledTexts) edje_text_class_set(name, nullptr, -percent);
+  setTextSize(textSize());
 }
 
 void DeviceTheme::applyScale() {
