@@ -45,7 +45,7 @@ void chooseTextSize(int percent) {
   DeviceTheme::applyTextSize();
 }
 
-/// One widget over a whole window.
+/// One widget on a white window.
 class DrawnTheme : public testing::Test {
  protected:
   DrawnTheme() {
@@ -53,6 +53,9 @@ class DrawnTheme : public testing::Test {
     chooseTextSize(100);
     _window = elm_win_add(nullptr, "theme-test", ELM_WIN_BASIC);
     evas_object_resize(_window, kWidth, kHeight);
+    Evas_Object* ground = evas_object_rectangle_add(evas_object_evas_get(_window));
+    evas_object_resize(ground, kWidth, kHeight);
+    evas_object_show(ground);
     evas_object_show(_window);
   }
   ~DrawnTheme() override {
@@ -97,11 +100,11 @@ class DrawnTheme : public testing::Test {
     Evas* canvas = evas_object_evas_get(_window);
     evas_event_feed_mouse_move(canvas, x, y, 0, nullptr);
     evas_event_feed_mouse_down(canvas, 1, EVAS_BUTTON_NONE, 1, nullptr);
-    edje_message_signal_process();
+    ecore_main_loop_iterate();
   }
   void release() {
     evas_event_feed_mouse_up(evas_object_evas_get(_window), 1, EVAS_BUTTON_NONE, 2, nullptr);
-    edje_message_signal_process();
+    ecore_main_loop_iterate();
   }
 
  private:
@@ -173,7 +176,7 @@ TEST_F(ThemeButton, ClicksUnlessItIsDisabled) {
   EXPECT_EQ(clicks, 1);
 
   elm_object_disabled_set(widget, EINA_TRUE);
-  pixels();
+  ecore_main_loop_iterate();
   press(60, 52);
   EXPECT_PRED2(alike, pixel(60, 52), kLightFillOff);
   release();
@@ -261,9 +264,6 @@ TEST_F(ThemeCheck, FillsItsDiscWhenItIsOn) {
 }
 
 TEST_F(ThemeCheck, TintsThePictureThatItMarks) {
-  Evas_Object* ground = evas_object_rectangle_add(evas_object_evas_get(window()));
-  evas_object_resize(ground, kWidth, kHeight);
-  evas_object_show(ground);
   Evas_Object* check = elm_check_add(window());
   shown(check);
   EXPECT_EQ(pixel(kWidth / 2, kHeight / 2), 0xffffffffu);
