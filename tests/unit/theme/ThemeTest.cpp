@@ -177,6 +177,7 @@ TEST_F(ThemeButton, ClicksUnlessItIsDisabled) {
 
   elm_object_disabled_set(widget, EINA_TRUE);
   ecore_main_loop_iterate();
+  EXPECT_PRED2(alike, pixel(60, 52), kLightFillOff);
   press(60, 52);
   EXPECT_PRED2(alike, pixel(60, 52), kLightFillOff);
   release();
