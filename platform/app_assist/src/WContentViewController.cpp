@@ -40,7 +40,10 @@ void WContentViewController::onSetMoreButton() {}
 
 void WContentViewController::setTitle(const char* title) {
   _c->title = title ? title : "";
-  if (_c->item) elm_object_item_text_set(_c->item, getTitle());
+  if (!_c->item) return;
+  elm_object_item_text_set(_c->item, getTitle());
+  // The toolkit itself tells screen readers the first title for ever.
+  efl_access_object_i18n_name_set(_c->item, getTitle());
 }
 
 const char* WContentViewController::getTitle() const {
