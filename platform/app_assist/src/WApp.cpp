@@ -13,6 +13,7 @@
 #include "GlibBridge.h"
 #include "Language.h"
 #include "LateDestroyer.h"
+#include "MarkupRefresh.h"
 #include "SettingKeys.h"
 #include "WindowPrivate.h"
 #include "app_assist/WNaviframeController.h"
@@ -31,6 +32,7 @@ struct WApp::Private {
   std::unique_ptr<appfw::AppService> service;
   std::unique_ptr<WWindowController> window;
   Ecore_Event_Handler* visibility = nullptr;
+  Ecore_Job* refresh = nullptr;
   bool paused = false;
 
   bool takeName();
@@ -40,9 +42,12 @@ struct WApp::Private {
   void followSettings(bool follow);
 
   static Eina_Bool visibilityCb(void* data, int, void* event);
+  void refreshLater();
+
+  static void refreshCb(void* data);
   static void languageCb(keynode_t*, void*) { Language::apply(); }
-  static void paletteCb(keynode_t*, void*) { DeviceTheme::applyPalette(); }
-  static void textSizeCb(keynode_t*, void*) { DeviceTheme::applyTextSize(); }
+  static void paletteCb(keynode_t*, void* data);
+  static void textSizeCb(keynode_t*, void* data);
 };
 
 WApp::WApp(int, char**) : _d(std::make_unique<Private>(this)) {}
@@ -136,6 +141,7 @@ int WApp::Private::run() {
 /// Views end while everything they use is there; the window that they looked at goes last.
 void WApp::Private::tearDown() {
   ecore_event_handler_del(visibility);
+  if (refresh) ecore_job_del(refresh);
   WViewController* base = window ? window->getBaseViewController() : nullptr;
   if (auto* naviframe = dynamic_cast<WNaviframeController*>(base))
     naviframe->destroyAllViewControllers();
@@ -153,11 +159,33 @@ void WApp::Private::followSettings(bool follow) {
       {VCONFKEY_LANGSET, languageCb}, {kThemeKey, paletteCb}, {kTextSizeKey, textSizeCb}};
   for (const auto& entry : kFollowed) {
     if (follow) {
-      vconf_notify_key_changed(entry.key, entry.callback, nullptr);
+      vconf_notify_key_changed(entry.key, entry.callback, this);
     } else {
       vconf_ignore_key_changed(entry.key, entry.callback);
     }
   }
+}
+
+/// The application's own tables hear of the change after this.
+void WApp::Private::refreshLater() {
+  if (!refresh) refresh = ecore_job_add(refreshCb, this);
+}
+
+void WApp::Private::refreshCb(void* data) {
+  auto* self = static_cast<Private*>(data);
+  self->refresh = nullptr;
+  Evas_Object* window = self->window ? self->window->getEvasObj() : nullptr;
+  if (window) refreshTexts(window);
+}
+
+void WApp::Private::paletteCb(keynode_t*, void* data) {
+  DeviceTheme::applyPalette();
+  static_cast<Private*>(data)->refreshLater();
+}
+
+void WApp::Private::textSizeCb(keynode_t*, void* data) {
+  DeviceTheme::applyTextSize();
+  static_cast<Private*>(data)->refreshLater();
 }
 
 Eina_Bool WApp::Private::visibilityCb(void* data, int, void* event) {

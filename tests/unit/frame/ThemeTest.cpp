@@ -159,8 +159,9 @@ TEST(DeviceTheme, AsksCellsAndRowsForWhatItShows) {
   EXPECT_NE(itemOf(deviceTheme(), "elm/genlist/item_compress/1line/default", "texts")
                 .find("elm.text.main.left"),
             std::string::npos);
-  EXPECT_EQ(itemOf(deviceTheme(), "elm/genlist/item_compress/group_index/default", "texts").substr(0, 8),
-            "elm.text");
+  EXPECT_EQ(
+      itemOf(deviceTheme(), "elm/genlist/item_compress/group_index/default", "texts").substr(0, 8),
+      "elm.text");
 }
 
 TEST(DeviceTheme, LetsAPopupBeDismissed) {
