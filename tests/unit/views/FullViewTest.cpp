@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <fstream>
+#include <set>
 
 #include "ViewTest.h"
 #include "ZQVCommon.h"
@@ -34,6 +35,43 @@ void signalDownload(const char* member, const char* url) {
 }
 
 }  // namespace
+
+/// Which files were in the middle of the pager in the frames that were painted.
+class PaintedPages {
+ public:
+  explicit PaintedPages(const Items& items)
+      : _items(items), _canvas(evas_object_evas_get(TestApp::get().window())) {
+    evas_event_callback_add(_canvas, EVAS_CALLBACK_RENDER_POST, _paintedCb, this);
+  }
+  ~PaintedPages() { stop(); }
+  void stop() {
+    evas_event_callback_del_full(_canvas, EVAS_CALLBACK_RENDER_POST, _paintedCb, this);
+  }
+  const std::set<int>& pages() const { return _pages; }
+
+ private:
+  static void _paintedCb(void* data, Evas*, void*) {
+    auto* self = static_cast<PaintedPages*>(data);
+    for (size_t i = 0; i < self->_items.size(); ++i) {
+      Elm_Object_Item* cell = self->_items[i].gridItems[ZQV_VIEW_FULL_RECEIVER];
+      if (cell && isInTheMiddle(cell)) self->_pages.insert(static_cast<int>(i));
+    }
+  }
+  static bool isInTheMiddle(Elm_Object_Item* cell) {
+    Evas_Object* object = elm_object_item_track(cell);
+    if (!object) return false;
+    int x = 0, width = 0, left = 0, all = 0;
+    evas_object_geometry_get(object, &x, nullptr, &width, nullptr);
+    elm_object_item_untrack(cell);
+    evas_object_geometry_get(elm_object_item_widget_get(cell), &left, nullptr, &all, nullptr);
+    const int middle = left + all / 2;
+    return x <= middle && middle < x + width;
+  }
+
+  const Items& _items;
+  Evas* _canvas;
+  std::set<int> _pages;
+};
 
 class FullView : public ViewTest {
  protected:
@@ -145,6 +183,17 @@ TEST_F(FullView, BeginsWithTheLastOfManyFiles) {
   items.addCount(5000);
   open(4999);
   EXPECT_TRUE(waitForPage(4999));
+}
+
+TEST_F(FullView, PaintsNoOtherPageFirst) {
+  items.addCount(10);
+  view = new Watched<ZQVFullView>(&isGone, items.list(), ZQV_VIEW_FULL_RECEIVER, "", "");
+  PaintedPages painted(items);
+  naviframe.push(view, &items[6], "fullview");
+  pager = view->getEvasObj();
+  ASSERT_TRUE(waitForPage(6));
+  painted.stop();
+  EXPECT_THAT(painted.pages(), ElementsAre(6));
 }
 
 TEST_F(FullView, MarksItsPagerWithItsKind) {

@@ -1,3 +1,5 @@
+#include <unistd.h>
+
 #include <fstream>
 
 #include "ViewTest.h"
@@ -104,6 +106,7 @@ TEST_F(Rows, ShowTheDefaultPictureForAPhotoThatCannotBeRead) {
 }
 
 TEST_F(Rows, MaskAPhotoTo74Pixels) {
+  if (access(ZQV_IMAGE_DIR, R_OK) != 0) GTEST_SKIP() << "the mask lies on the phone";
   const char* photo = ZQV_IMAGE_DIR "fileicon/148x148/zq_file_full_ic_img.png";
   Evas_Object* image = picture(photo);
   ASSERT_NE(fileOf(image), ZQV_DEFAULT_CALLER_IMAGE);
