@@ -42,8 +42,9 @@ void WContentViewController::setTitle(const char* title) {
   _c->title = title ? title : "";
   if (!_c->item) return;
   elm_object_item_text_set(_c->item, getTitle());
-  // The toolkit itself tells screen readers the first title for ever.
-  efl_access_object_i18n_name_set(_c->item, getTitle());
+  // The page that screen readers see is the item's own layout, and the toolkit gives that the first
+  // title for ever.
+  efl_access_object_i18n_name_set(elm_object_parent_widget_get(getEvasObj()), getTitle());
 }
 
 const char* WContentViewController::getTitle() const {
