@@ -31,6 +31,7 @@ class ZQVExpiredView : public app_assist::WContentViewController {
 
  private:
   std::string _titleText() const;
+  void _nameTitle();
   std::string _dateText() const;
   void _showTexts();
 

@@ -48,6 +48,7 @@ class ZQVReceiverView : public app_assist::WContentViewController {
  private:
   static void _gridDeletedCb(void* data, Evas* canvas, Evas_Object* grid, void* info);
   std::string _titleText() const;
+  void _nameTitle();
   std::string _sizeLine() const;
   std::string _expiryLine() const;
   std::string _hint() const;

@@ -15,6 +15,7 @@
 namespace {
 
 constexpr size_t kTextLimit = 512;
+constexpr const char* kTitle = "IDS_RSH_HEADER_FILES_SHARED_BY_PS_ABB";
 constexpr const char* kDownloadText = "IDS_RSH_BUTTON_DOWNLOAD_ABB3";
 
 Evas_Object* createLabel(Evas_Object* layout, const char* part) {
@@ -70,6 +71,7 @@ Elm_Object_Item* ZQVExpiredView::onPushToNaviframe(Evas_Object* naviframe) {
 
 void ZQVExpiredView::onPushed(Elm_Object_Item* item) {
   if (*getTitle()) elm_object_item_domain_text_translatable_set(item, ZQV_TEXT_DOMAIN, EINA_TRUE);
+  _nameTitle();
   Evas_Object* download = elm_button_add(elm_object_item_widget_get(item));
   elm_object_style_set(download, "bottom");
   elm_object_domain_translatable_text_set(download, ZQV_TEXT_DOMAIN, kDownloadText);
@@ -89,6 +91,7 @@ void ZQVExpiredView::update(int event) {
   if (!title.empty()) {
     elm_object_item_domain_translatable_text_set(item, ZQV_TEXT_DOMAIN, title.c_str());
   }
+  _nameTitle();
   _showTexts();
   Evas_Object* download = item ? elm_object_item_part_content_get(item, "toolbar") : nullptr;
   if (!download) {
@@ -97,8 +100,8 @@ void ZQVExpiredView::update(int event) {
   }
   // The id, not what it reads now: else the button would stay in this language.
   const char* text = elm_object_translatable_text_get(download);
-  if (!text) text = elm_object_text_get(download);
-  if (!text) {
+  if (!text || !*text) text = elm_object_text_get(download);
+  if (!text || !*text) {
     ZQV_ERROR("button text is null!");
     return;
   }
@@ -132,8 +135,13 @@ void ZQVExpiredView::_backTitleButtonPressedCb(void* data, Evas_Object*, void*) 
 
 std::string ZQVExpiredView::_titleText() const {
   if (_senderName.empty()) return {};
-  return zqvFormatName("IDS_RSH_HEADER_FILES_SHARED_BY_PS_ABB", _senderName.c_str(),
-                       kTextLimit - 1);
+  return zqvFormatName(kTitle, _senderName.c_str(), kTextLimit - 1);
+}
+
+/// A screen reader reads text, not markup.
+void ZQVExpiredView::_nameTitle() {
+  if (_senderName.empty()) return;
+  zqvSetAccessibleName(getNaviItem(), zqvFormat(kTitle, "s", _senderName.c_str()));
 }
 
 std::string ZQVExpiredView::_dateText() const {

@@ -20,8 +20,7 @@ ZQVLaunchRequest::ZQVLaunchRequest(app_control_h request)
 
 bool ZQVLaunchRequest::isForViewer(app_control_h request) {
   Text operation;
-  if (app_control_get_operation(request, operation.out()) != APP_CONTROL_ERROR_NONE ||
-      !operation) {
+  if (app_control_get_operation(request, operation.out()) != APP_CONTROL_ERROR_NONE || !operation) {
     ZQV_ERROR("Invalid operation: %s", "operation is NULL");
     return false;
   }

@@ -19,6 +19,7 @@ namespace {
 
 constexpr size_t kTextLimit = 512;
 constexpr const char* kRegionFormat = "db/menu_widget/regionformat";
+constexpr const char* kTitle = "IDS_RSH_HEADER_FILES_SHARED_BY_PS_ABB";
 constexpr const char* kDownloadText = "IDS_RSH_BUTTON_DOWNLOAD_ABB3";
 
 const char* nonNull(const char* text) {
@@ -90,6 +91,7 @@ Elm_Object_Item* ZQVReceiverView::onPushToNaviframe(Evas_Object* naviframe) {
 
 void ZQVReceiverView::onPushed(Elm_Object_Item* item) {
   elm_object_item_domain_text_translatable_set(item, ZQV_TEXT_DOMAIN, EINA_TRUE);
+  _nameTitle();
   Evas_Object* download = elm_button_add(elm_object_item_widget_get(item));
   elm_object_style_set(download, "bottom");
   elm_object_domain_translatable_text_set(download, ZQV_TEXT_DOMAIN, kDownloadText);
@@ -124,6 +126,7 @@ void ZQVReceiverView::update(int key) {
   const std::string title = _titleText();
   setTitle(title.c_str());
   elm_object_item_domain_translatable_text_set(getNaviItem(), ZQV_TEXT_DOMAIN, title.c_str());
+  _nameTitle();
   elm_object_text_set(_label, ZQVOwnedText(getSummaryText()).get());
   _updateCells();
   Evas_Object* download = _toolbarButton();
@@ -141,8 +144,12 @@ char* ZQVReceiverView::getSummaryText() const {
 }
 
 std::string ZQVReceiverView::_titleText() const {
-  return zqvFormatName("IDS_RSH_HEADER_FILES_SHARED_BY_PS_ABB", _senderName.c_str(),
-                       kTextLimit - 1);
+  return zqvFormatName(kTitle, _senderName.c_str(), kTextLimit - 1);
+}
+
+/// A screen reader reads text, not markup.
+void ZQVReceiverView::_nameTitle() {
+  zqvSetAccessibleName(getNaviItem(), zqvFormat(kTitle, "s", _senderName.c_str()));
 }
 
 std::string ZQVReceiverView::_sizeLine() const {

@@ -68,6 +68,14 @@ TEST_F(ReceiverView, ShowsTheSendersNameAsItIs) {
   EXPECT_EQ(title(), "From &lt;b&gt;&amp;");
 }
 
+TEST_F(ReceiverView, TellsScreenReadersTheSendersName) {
+  show(false, "<b>&");
+  EXPECT_STREQ(efl_access_object_i18n_name_get(topItem()), "From <b>&");
+  view->setName("Berta");
+  view->update(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE);
+  EXPECT_STREQ(efl_access_object_i18n_name_get(topItem()), "From Berta");
+}
+
 TEST_F(ReceiverView, CutsAVeryLongNameWithinItsTitle) {
   show(false, std::string(2000, '&').c_str());
   EXPECT_LE(title().size(), 511u);

@@ -21,6 +21,8 @@
 #include <cstdlib>
 #include <cstring>
 #include <ctime>
+#include <list>
+#include <utility>
 
 #include "ZQVSharedFiles.h"
 
@@ -30,6 +32,11 @@ FakePlatform& FakePlatform::get() {
 }
 
 void FakePlatform::reset() {
+  // What the service hands out stays valid until the process ends.
+  static std::list<std::map<std::string, FakeShare>> receivedBefore;
+  static std::list<std::map<int, FakeShare>> sentBefore;
+  receivedBefore.push_back(std::move(received));
+  sentBefore.push_back(std::move(sent));
   *this = FakePlatform();
 }
 
