@@ -14,7 +14,7 @@ bool TestApp::onCreate() {
 }
 
 bool waitUntil(const std::function<bool()>& condition) {
-  constexpr double kPatience = 10.0;
+  constexpr double kPatience = 30.0;
   const double deadline = ecore_time_get() + kPatience;
   // The tick only wakes the loop up, so that the condition is looked at again.
   Ecore_Timer* tick = ecore_timer_add(
