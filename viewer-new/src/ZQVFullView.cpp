@@ -325,6 +325,8 @@ void ZQVFullView::_updateDownloadedStatus() {
     ZQV_ERROR("_curItem is NULL");
     return;
   }
+  // The page has no title; to screen readers it is the file on it.
+  zqvNamePage(*this, zqvCellName(*_curItem));
   if (_isSentShare()) {
     _updateSentStatus();
     return;

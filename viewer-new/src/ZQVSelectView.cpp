@@ -89,6 +89,7 @@ void ZQVSelectView::onPushed(Elm_Object_Item* item) {
   elm_object_item_part_content_set(
       item, kCancelPart, _createTitleButton("naviframe/title_left", kCancel, _cancelBtnCb));
   _rotation.connect(zqvWindowOf(*this), "rotation,changed", _rotateCb, this);
+  zqvNamePage(*this, zqvText(kTitle));
 }
 
 bool ZQVSelectView::onPop() {
@@ -322,4 +323,5 @@ void ZQVSelectView::_showSelectedCount() {
 
 void ZQVSelectView::_setTitleText(const char* text) {
   elm_object_item_domain_translatable_part_text_set(getNaviItem(), nullptr, ZQV_TEXT_DOMAIN, text);
+  zqvNamePage(*this, zqvText(text));
 }

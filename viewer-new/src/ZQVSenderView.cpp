@@ -126,6 +126,7 @@ Elm_Object_Item* ZQVSenderView::onPushToNaviframe(Evas_Object* naviframe) {
 
 void ZQVSenderView::onPushed(Elm_Object_Item* item) {
   elm_object_item_domain_text_translatable_set(item, ZQV_TEXT_DOMAIN, EINA_TRUE);
+  zqvNamePage(*this, zqvText(kTitle));
   if (!_isGridOnly) {
     Evas_Object* box = elm_box_add(getNaviframe()->getEvasObj());
     elm_box_horizontal_set(box, EINA_TRUE);
@@ -161,6 +162,7 @@ void ZQVSenderView::update(int event) {
   if (event != SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE) return;
   elm_object_item_domain_translatable_part_text_set(getNaviItem(), nullptr, ZQV_TEXT_DOMAIN,
                                                     kTitle);
+  zqvNamePage(*this, zqvText(kTitle));
   if (!_updateRows()) return;
   _updateToolbar();
   if (_processingPopup) {
