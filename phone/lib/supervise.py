@@ -2,6 +2,7 @@
 
 import os
 import signal
+import subprocess
 import sys
 import threading
 
@@ -53,7 +54,8 @@ class Phone:
 
     def start(self):
         together(self._start_screen, self._start_session, self._start_system)
-        together(self._start_notifications, self._warm_contacts, self._configure_applications)
+        together(self._start_notifications, self._warm_contacts, self._configure_applications,
+                 self._sign_up)
 
     def program(self, name, argv, env=None):
         program = Program(name, argv, self.state.path("log", name + ".log"),
@@ -132,6 +134,16 @@ class Phone:
 
     def _configure_applications(self):
         self.sharing.start()
+
+    def _sign_up(self):
+        """A new phone has an account with the sharing service on. Later its user decides."""
+        account = self.tool("phone-account")
+        if not account or os.path.exists(self.state.path("opt-usr", "dbspace", "account.db")):
+            return
+        done = subprocess.run([account, "on", self.settings["number"]], env=self.environment,
+                              capture_output=True, stdin=subprocess.DEVNULL, text=True)
+        if done.returncode != 0:
+            raise Failure("the phone's account: " + done.stderr.strip())
 
     # --- what callers may ask for ---
 
