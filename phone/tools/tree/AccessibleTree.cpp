@@ -9,10 +9,13 @@ namespace {
 
 constexpr const char* kAccessible = "org.a11y.atspi.Accessible";
 constexpr const char* kComponent = "org.a11y.atspi.Component";
+constexpr const char* kProperties = "org.freedesktop.DBus.Properties";
 constexpr const char* kRegistry = "org.a11y.atspi.Registry";
 constexpr const char* kRoot = "/org/a11y/atspi/accessible/root";
 constexpr guint32 kScreenCoordinates = 0;
 constexpr int kTimeoutMs = 5000;
+constexpr int kMostOpen = 100;     // questions under way: more would wait longer than kTimeoutMs
+constexpr size_t kLongList = 100;  // items
 
 void readStates(Widget& widget, GVariant* answer) {
   const OwnedVariant words(g_variant_get_child_value(answer, 0));
@@ -22,6 +25,14 @@ void readStates(Widget& widget, GVariant* answer) {
       static_cast<const guint32*>(g_variant_get_fixed_array(words.get(), &count, sizeof(guint32)));
   if (count > 0) widget.states = values[0];
   if (count > 1) widget.states |= static_cast<uint64_t>(values[1]) << 32;
+}
+
+int readCount(GVariant* answer) {
+  const OwnedVariant boxed(g_variant_get_child_value(answer, 0));
+  if (!g_variant_is_of_type(boxed.get(), G_VARIANT_TYPE_VARIANT)) return 0;
+  const OwnedVariant count(g_variant_get_variant(boxed.get()));
+  return g_variant_is_of_type(count.get(), G_VARIANT_TYPE_INT32) ? g_variant_get_int32(count.get())
+                                                                 : 0;
 }
 
 void readName(Widget& widget, GVariant* answer) {
@@ -53,6 +64,9 @@ void readRole(Widget& widget, GVariant* answer) {
 
 struct AccessibleTree::Question {
   AccessibleTree* tree;
+  const Widget* widget;
+  const char *interface, *method;
+  OwnedVariant arguments;
   Answer answer;
 };
 
@@ -103,14 +117,60 @@ std::unique_ptr<Widget> AccessibleTree::read() {
 }
 
 void AccessibleTree::_askAll(Widget& widget) {
-  Widget* const asked = &widget;
-  _ask(widget, kAccessible, "GetState", nullptr, [=](GVariant* a) { readStates(*asked, a); });
-  _ask(widget, kAccessible, "GetRoleName", nullptr, [=](GVariant* a) { readRole(*asked, a); });
-  _ask(widget, "org.freedesktop.DBus.Properties", "Get", g_variant_new("(ss)", kAccessible, "Name"),
-       [=](GVariant* a) { readName(*asked, a); });
+  _askState(widget);
+  _askName(widget);
+  _askRest(widget);
+}
+
+void AccessibleTree::_askState(Widget& widget) {
+  _ask(widget, kAccessible, "GetState", nullptr,
+       [&widget](GVariant* answer) { readStates(widget, answer); });
+}
+
+void AccessibleTree::_askName(Widget& widget) {
+  _ask(widget, kProperties, "Get", g_variant_new("(ss)", kAccessible, "Name"),
+       [&widget](GVariant* answer) { readName(widget, answer); });
+}
+
+void AccessibleTree::_askRest(Widget& widget) {
+  _ask(widget, kAccessible, "GetRoleName", nullptr,
+       [&widget](GVariant* answer) { readRole(widget, answer); });
   _ask(widget, kComponent, "GetExtents", g_variant_new("(u)", kScreenCoordinates),
-       [=](GVariant* a) { readArea(*asked, a); });
-  _ask(widget, kAccessible, "GetChildren", nullptr, [=](GVariant* a) { _addChildren(*asked, a); });
+       [&widget](GVariant* answer) { readArea(widget, answer); });
+  _ask(widget, kProperties, "Get", g_variant_new("(ss)", kAccessible, "ChildCount"),
+       [this, &widget](GVariant* answer) { _askChildren(widget, readCount(answer)); });
+}
+
+void AccessibleTree::_askChildren(Widget& widget, int count) {
+  if (count <= kMostAtOnce) {
+    _ask(widget, kAccessible, "GetChildren", nullptr,
+         [this, &widget](GVariant* answer) { _addChildren(widget, answer); });
+    return;
+  }
+  for (int i = 0; i < kSome; i++) {
+    widget.children.push_back(std::make_unique<Widget>());
+    Widget& child = *widget.children.back();
+    _ask(widget, kAccessible, "GetChildAtIndex", g_variant_new("(i)", i),
+         [this, &child](GVariant* answer) {
+           if (!g_variant_is_of_type(answer, G_VARIANT_TYPE("((so))"))) return;
+           const char *name = nullptr, *path = nullptr;
+           g_variant_get(answer, "((&s&o))", &name, &path);
+           child.bus = name;
+           child.path = path;
+           _askBriefly(child);
+         });
+  }
+}
+
+/// An item of a long list: in full only when it can be seen.
+void AccessibleTree::_askBriefly(Widget& item) {
+  item.role = "list item";
+  item.hasArea = true;
+  _askName(item);
+  _ask(item, kAccessible, "GetState", nullptr, [this, &item](GVariant* answer) {
+    readStates(item, answer);
+    if (item.is("showing")) _askRest(item);
+  });
 }
 
 void AccessibleTree::_addChildren(Widget& widget, GVariant* answer) {
@@ -124,16 +184,35 @@ void AccessibleTree::_addChildren(Widget& widget, GVariant* answer) {
     child->bus = name;
     child->path = path;
     widget.children.push_back(std::move(child));
-    _askAll(*widget.children.back());
+  }
+  const bool isLong = widget.children.size() > kLongList && widget.is("manages-descendants");
+  for (const auto& child : widget.children) {
+    if (isLong) {
+      _askBriefly(*child);
+    } else {
+      _askAll(*child);
+    }
   }
 }
 
 void AccessibleTree::_ask(const Widget& widget, const char* interface, const char* method,
                           GVariant* arguments, Answer answer) {
-  _open++;
-  g_dbus_connection_call(_bus, widget.bus.c_str(), widget.path.c_str(), interface, method,
-                         arguments, nullptr, G_DBUS_CALL_FLAGS_NO_AUTO_START, kTimeoutMs,
-                         _cancellable.get(), _answeredCb, new Question{this, std::move(answer)});
+  OwnedVariant owned(arguments ? g_variant_ref_sink(arguments) : nullptr);
+  _waiting.emplace_back(
+      new Question{this, &widget, interface, method, std::move(owned), std::move(answer)});
+  _send();
+}
+
+void AccessibleTree::_send() {
+  while (_open < kMostOpen && !_waiting.empty()) {
+    Question* const question = _waiting.front().release();
+    _waiting.pop_front();
+    _open++;
+    g_dbus_connection_call(_bus, question->widget->bus.c_str(), question->widget->path.c_str(),
+                           question->interface, question->method, question->arguments.get(),
+                           nullptr, G_DBUS_CALL_FLAGS_NO_AUTO_START, kTimeoutMs, _cancellable.get(),
+                           _answeredCb, question);
+  }
 }
 
 void AccessibleTree::_answeredCb(GObject* bus, GAsyncResult* result, gpointer data) {
@@ -148,5 +227,7 @@ void AccessibleTree::_answeredCb(GObject* bus, GAsyncResult* result, gpointer da
              g_error_matches(error.get(), G_DBUS_ERROR, G_DBUS_ERROR_SERVICE_UNKNOWN) ||
              g_error_matches(error.get(), G_DBUS_ERROR, G_DBUS_ERROR_NAME_HAS_NO_OWNER)) {
     question->tree->_failed = true;
+    question->tree->_waiting.clear();
   }  // else the widget has gone, or is of a kind that does not know the answer
+  question->tree->_send();
 }

@@ -1,9 +1,12 @@
-// Reads the accessible tree of one application. All questions that can be asked at once are asked
-// at once, so that a list of thousands of items takes a few round trips.
+// Reads the accessible tree of one application. Many questions are under way at once, and of long
+// lists only what can be seen is asked about in full, so that a list of thousands of items takes
+// seconds, not minutes. Of more than kMostAtOnce items only the first kSome are there: the toolkit
+// cannot send a longer answer.
 #pragma once
 
 #include <base/Owned.h>
 
+#include <deque>
 #include <functional>
 #include <memory>
 #include <string>
@@ -17,6 +20,8 @@ class AccessibleTree {
   AccessibleTree(const AccessibleTree&) = delete;
   AccessibleTree& operator=(const AccessibleTree&) = delete;
 
+  static constexpr int kMostAtOnce = 4000, kSome = 1000;
+
   /// Whether the process has come to the accessibility bus. read() is about that application.
   bool find(int pid);
 
@@ -29,7 +34,13 @@ class AccessibleTree {
 
   void _ask(const Widget& widget, const char* interface, const char* method, GVariant* arguments,
             Answer answer);
+  void _send();
   void _askAll(Widget& widget);
+  void _askState(Widget& widget);
+  void _askName(Widget& widget);
+  void _askRest(Widget& widget);
+  void _askBriefly(Widget& item);
+  void _askChildren(Widget& widget, int count);
   void _addChildren(Widget& widget, GVariant* list);
   int _pidOf(const char* name);
   static void _answeredCb(GObject* bus, GAsyncResult* result, gpointer question);
@@ -37,6 +48,7 @@ class AccessibleTree {
   GDBusConnection* const _bus;
   const base::Owned<GCancellable, g_object_unref> _cancellable;
   std::string _name, _path;
+  std::deque<std::unique_ptr<Question>> _waiting;
   int _open = 0;
   bool _failed = false;
 };

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <fstream>
 
 #include "Phone.h"
 
@@ -79,12 +80,46 @@ TEST_F(BadRequest, WithInvalidUtf8IsSurvived) {
   EXPECT_TRUE(waitFor([&] { return phone.tree().named("Good.txt") != nullptr; })) << phone.tree();
 }
 
-TEST_F(BadRequest, ForAShareThatLacksNamesSizesAndTypesIsSurvived) {
+namespace {
+
+std::string manifest(const std::string& json) {
+  const std::string file = thePhone().makeFile("manifest.json", 0);
+  std::ofstream(file) << json;
+  return file;
+}
+
+}  // namespace
+
+TEST_F(BadRequest, ForAShareThatLacksNamesSizesAndTypesShowsWhatIsWhole) {
   Phone& phone = thePhone();
-  const std::string manifest = phone.makeFile("manifest.json", 0);
-  phone::run({"sh", "-c", "printf '%s' \"$2\" >\"$1\"", "sh", manifest,
-              R"([{}, {"name": null}, {"size": -5}, {"type": 7}, {"name": "Named.txt"}])"});
-  const phone::Share share = phone.share({}, {"--raw-manifest", manifest});
+  const phone::Share share = phone.share(
+      {},
+      {"--raw-manifest", manifest(R"([{}, {"name": null}, {"size": 0}, {"name": "Only a name.txt"},
+                        {"name": "Whole.txt", "size": 5, "type": "text/plain"}])")});
   phone.launchReceived(share.token);
-  EXPECT_TRUE(waitFor([&] { return phone.tree().named("Named.txt") != nullptr; })) << phone.tree();
+  EXPECT_TRUE(waitFor([&] { return phone.tree().named("Whole.txt") != nullptr; })) << phone.tree();
+}
+
+TEST_F(BadRequest, ForAShareWithoutFilesShowsAPageWithoutFiles) {
+  Phone& phone = thePhone();
+  const phone::Share share = phone.share({}, {"--raw-manifest", manifest("[]")});
+  phone.launchReceived(share.token);
+  EXPECT_TRUE(waitFor([&] {
+    const phone::Tree tree = phone.tree();
+    return tree.named("Download") && !tree.enables("Download") && tree.items().empty();
+  })) << phone.tree();
+}
+
+TEST_F(BadRequest, ForAShareOfTenThousandFilesShowsThePage) {
+  constexpr size_t kFiles = 10000;
+  std::string json = "[";
+  for (size_t i = 0; i < kFiles; i++) {
+    json += (i ? R"(,{"name":"File )" : R"({"name":"File )") + std::to_string(i) +
+            R"(.txt","size":1,"type":"text/plain"})";
+  }
+  Phone& phone = thePhone();
+  const phone::Share share = phone.share({}, {"--raw-manifest", manifest(json + "]")});
+  phone.launchReceived(share.token);
+  EXPECT_TRUE(
+      waitFor([&] { return phone.tree().items().size() == kFiles; }, std::chrono::seconds(60)));
 }

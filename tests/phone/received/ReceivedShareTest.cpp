@@ -97,7 +97,7 @@ TEST_F(ReceivedShare, ShowsTheExpiredPageWhenItsTimeIsOver) {
   phone.launchReceived(share.token);
   EXPECT_TRUE(waitFor([&] {
     const Tree tree = phone.tree();
-    return !tree.widgets().empty() && tree.items().empty() && !tree.named("Download") &&
+    return !tree.widgets().empty() && tree.items().empty() && !tree.enables("Download") &&
            tree.text().find(kSender) != std::string::npos;
   })) << phone.tree();
 }

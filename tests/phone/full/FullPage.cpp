@@ -1,0 +1,127 @@
+#include "FullPage.h"
+
+#include <filesystem>
+
+namespace fs = std::filesystem;
+using phone::Area;
+using phone::thePhone;
+using phone::Tree;
+using phone::waitFor;
+using phone::Widget;
+using phone::Words;
+
+namespace {
+
+constexpr const char* kOwnNumber = "+821012345678";
+constexpr const char* kFriend = "+821011112222";
+constexpr const char* kNoApplication = "No app found for this action.";
+
+bool isSame(const Area& a, const Area& b) {
+  return a.x == b.x && a.y == b.y && a.width == b.width && a.height == b.height;
+}
+
+testing::AssertionResult result(bool came, const std::string& what) {
+  if (came) return testing::AssertionSuccess();
+  return testing::AssertionFailure() << what << " on\n" << thePhone().tree();
+}
+
+testing::AssertionResult buttonIs(const std::string& name, const std::string& state) {
+  const bool came = waitFor([&] {
+    const Tree tree = thePhone().tree();
+    for (const Widget& widget : tree.widgets()) {
+      if (widget.role == "push button" && widget.name == name && widget.is(state)) return true;
+    }
+    return false;
+  });
+  return result(came, "no " + state + " \"" + name + "\"");
+}
+
+void tapCell(const std::string& name) {
+  ASSERT_TRUE(comes(name));
+  thePhone()({"tap", name});
+  ASSERT_TRUE(pageIs(name));
+}
+
+}  // namespace
+
+void FullPage::TearDown() {
+  thePhone()({"service", "ok"});
+  thePhone()({"network", "wifi"});
+  thePhone()({"rotate", "0"});
+  thePhone().closeViewer();
+  thePhone()({"shell", "sh", "-c", "p=$(pidof gpicview l3afpad mpv zathura) && kill $p; true"});
+  for (const auto& file : fs::directory_iterator(ofPhone("/opt/usr/media/Downloads"))) {
+    fs::remove_all(file);
+  }
+}
+
+Words numberedFiles(int count) {
+  Words names;
+  for (int i = 1; i <= count; i++) {
+    names.push_back(thePhone().makeFile("File " + std::to_string(i) + ".txt", 10));
+  }
+  return names;
+}
+
+void openReceived(const Words& files, const std::string& cell) {
+  thePhone().launchReceived(thePhone().share(files).token);
+  tapCell(cell);
+}
+
+void openSent(const Words& files, const std::string& cell) {
+  const phone::Share share = thePhone().shareTo(kFriend, kOwnNumber, files);
+  thePhone()({"launch", "sent", "--request", std::to_string(share.request)});
+  tapCell(cell);
+}
+
+std::string pageOn(const Tree& tree) {
+  const Widget* pager = nullptr;
+  for (const Widget& widget : tree.widgets()) {
+    if (widget.role == "tree table" && widget.is("showing")) pager = &widget;
+  }
+  if (!pager) return {};
+  for (const Widget& widget : tree.items()) {
+    if (widget.is("showing") && isSame(widget.area, pager->area)) return widget.name;
+  }
+  return {};
+}
+
+testing::AssertionResult pageIs(const std::string& name) {
+  return result(waitFor([&] { return pageOn(thePhone().tree()).rfind(name + ", ", 0) == 0; }),
+                "\"" + name + "\" is not the page");
+}
+
+void swipeForth() {
+  thePhone()({"swipe", "600,640", "200,640", "150"});
+}
+
+void swipeBack() {
+  thePhone()({"swipe", "120,640", "520,640", "150"});
+}
+
+testing::AssertionResult buttonIsEnabled(const std::string& name) {
+  return buttonIs(name, "enabled");
+}
+
+testing::AssertionResult buttonIsDisabled(const std::string& name) {
+  return buttonIs(name, "disabled");
+}
+
+testing::AssertionResult download() {
+  const testing::AssertionResult tapped = tap("Download");
+  return tapped ? buttonIsEnabled("Open") : tapped;
+}
+
+size_t countOf(const std::string& text, const std::string& part) {
+  size_t count = 0;
+  for (size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) count++;
+  return count;
+}
+
+testing::AssertionResult openIsRefused() {
+  const auto refusals = [] { return countOf(thePhone()({"messages"}), kNoApplication); };
+  const size_t before = refusals();
+  const testing::AssertionResult tapped = tap("Open");
+  if (!tapped) return tapped;
+  return result(waitFor([&] { return refusals() == before + 1; }), "no message");
+}

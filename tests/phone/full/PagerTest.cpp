@@ -1,0 +1,120 @@
+// One file per page, and the way from page to page.
+
+#include <fstream>
+
+#include "FullPage.h"
+
+using phone::thePhone;
+using phone::waitFor;
+
+namespace {
+
+using Pager = FullPage;
+
+std::string file(int number) {
+  return "File " + std::to_string(number) + ".txt";
+}
+
+std::string manifestOf(int files) {
+  std::string json;
+  for (int i = 1; i <= files; i++) {
+    json += (i > 1 ? R"(,{"name":")" : R"([{"name":")") + file(i) +
+            R"(","size":1,"type":"text/plain"})";
+  }
+  const std::string path = thePhone().makeFile("manifest.json", 0);
+  std::ofstream(path) << json << ']';
+  return path;
+}
+
+}  // namespace
+
+TEST_F(Pager, ShowsTheFileThatWasTapped) {
+  openReceived(numberedFiles(9), file(5));
+}
+
+TEST_F(Pager, MovesOnePageWithASwipe) {
+  openReceived(numberedFiles(4), file(2));
+  swipeForth();
+  EXPECT_TRUE(pageIs(file(3)));
+  swipeBack();
+  EXPECT_TRUE(pageIs(file(2)));
+}
+
+TEST_F(Pager, MovesNoFurtherThanOnePageWithAFastSwipe) {
+  openReceived(numberedFiles(6), file(1));
+  thePhone()({"swipe", "700,640", "20,640", "40"});
+  EXPECT_TRUE(pageIs(file(2)));
+}
+
+TEST_F(Pager, StaysOnItsPageAfterAShortPull) {
+  openReceived(numberedFiles(3), file(2));
+  thePhone()({"swipe", "400,640", "310,640", "600"});
+  EXPECT_TRUE(pageIs(file(2)));
+}
+
+TEST_F(Pager, GoesTenPagesForthAndBack) {
+  openReceived(numberedFiles(12), file(1));
+  for (int page = 2; page <= 11; page++) {
+    swipeForth();
+    ASSERT_TRUE(pageIs(file(page)));
+  }
+  for (int page = 10; page >= 1; page--) {
+    swipeBack();
+    ASSERT_TRUE(pageIs(file(page)));
+  }
+}
+
+TEST_F(Pager, EndsAtTheFirstAndTheLastFile) {
+  openReceived(numberedFiles(2), file(1));
+  swipeBack();
+  EXPECT_TRUE(pageIs(file(1)));
+  swipeForth();
+  EXPECT_TRUE(pageIs(file(2)));
+  swipeForth();
+  EXPECT_TRUE(pageIs(file(2)));
+}
+
+TEST_F(Pager, StaysOnTheSeventhPageWhenThePhoneIsTurned) {
+  openReceived(numberedFiles(9), file(7));
+  for (const char* turn : {"90", "0", "270", "0"}) {
+    SCOPED_TRACE(turn);
+    thePhone()({"rotate", turn});
+    const bool lies = turn != std::string("0");
+    ASSERT_TRUE(waitFor([&] {
+      const phone::Tree tree = thePhone().tree();
+      return !tree.widgets().empty() && pageOn(tree).rfind(file(7) + ", ", 0) == 0 &&
+             (tree.items()[6].area.height > tree.items()[6].area.width) == lies;
+    })) << thePhone().tree();
+  }
+}
+
+TEST_F(Pager, FollowsASwipeOnAPhoneThatLies) {
+  openReceived(numberedFiles(3), file(2));
+  thePhone()({"rotate", "90"});
+  ASSERT_TRUE(pageIs(file(2)));
+  thePhone()({"painted"});
+  thePhone()({"swipe", "370,400", "370,800", "150"});
+  EXPECT_TRUE(pageIs(file(3)));
+}
+
+TEST_F(Pager, FindsThePageAmongFiveThousand) {
+  constexpr int kFiles = 5000;
+  thePhone().launchReceived(thePhone().share({}, {"--raw-manifest", manifestOf(kFiles)}).token);
+  ASSERT_TRUE(
+      waitFor([] { return thePhone().tree().items().size() == kFiles; }, std::chrono::seconds(60)));
+  for (int i = 0; i < 3; i++) thePhone()({"swipe", "360,1100", "360,300", "60"});
+  thePhone()({"painted"});
+  thePhone()({"tap", "360,700"});
+  std::string first;
+  ASSERT_TRUE(waitFor([&] { return !(first = pageOn(thePhone().tree())).empty(); }));
+  const int number = std::stoi(first.substr(first.find(' ')));
+  EXPECT_GT(number, 12) << "the page below did not move";
+  swipeForth();
+  EXPECT_TRUE(pageIs(file(number + 1)));
+}
+
+TEST_F(Pager, ReturnsToTheShareOnBack) {
+  openReceived(numberedFiles(3), file(2));
+  thePhone()({"key", "Escape"});
+  EXPECT_TRUE(comes("Files from"));
+}

@@ -1,0 +1,53 @@
+// The pages of a sent share: its files are opened, never downloaded.
+
+#include <filesystem>
+
+#include "FullPage.h"
+
+namespace fs = std::filesystem;
+using phone::kBlue;
+using phone::thePhone;
+using phone::waitFor;
+
+namespace {
+
+using SentPages = FullPage;
+
+}  // namespace
+
+TEST_F(SentPages, OfferToOpenAFileThatIsOnThePhone) {
+  const std::string file = phone::makePicture(thePhone(), "Lake.png", kBlue);
+  openSent({file}, "Lake.png");
+  ASSERT_TRUE(buttonIsEnabled("Open"));
+  EXPECT_TRUE(waitFor([] { return phone::colourAt(thePhone(), 360, 640).isAbout(kBlue); }))
+      << phone::colourAt(thePhone(), 360, 640);
+  ASSERT_TRUE(tap("Open"));
+  EXPECT_TRUE(waitFor([&] {
+    return thePhone()({"launches", "--all"}).find("Lake.png\"") != std::string::npos;
+  }));
+}
+
+TEST_F(SentPages, OfferNothingForAFileThatIsMissing) {
+  const std::string gone = thePhone().makeFile("Gone.txt");
+  const std::string kept = thePhone().makeFile("Kept.txt");
+  const phone::Share share = thePhone().shareTo("+821011112222", "+821012345678", {gone, kept});
+  fs::remove(gone);
+  thePhone()({"launch", "sent", "--request", std::to_string(share.request)});
+  ASSERT_TRUE(tap("Gone.txt"));
+  ASSERT_TRUE(pageIs("Gone.txt"));
+  EXPECT_TRUE(buttonIsDisabled("Open"));
+  swipeForth();
+  ASSERT_TRUE(pageIs("Kept.txt"));
+  EXPECT_TRUE(buttonIsEnabled("Open"));
+  swipeBack();
+  ASSERT_TRUE(pageIs("Gone.txt"));
+  EXPECT_TRUE(buttonIsDisabled("Open"));
+}
+
+TEST_F(SentPages, KeepTheButtonsTextWhenTheLanguageChanges) {
+  openSent({thePhone().makeFile("Words.txt")}, "Words.txt");
+  thePhone()({"language", "de_DE.UTF-8"});
+  EXPECT_TRUE(buttonIsEnabled("Öffnen"));
+  thePhone()({"language", "en_US.UTF-8"});
+  EXPECT_TRUE(buttonIsEnabled("Open"));
+}

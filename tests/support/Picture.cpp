@@ -1,0 +1,82 @@
+#include "Picture.h"
+
+#include <gdk-pixbuf/gdk-pixbuf.h>
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <memory>
+#include <ostream>
+
+namespace phone {
+namespace {
+
+struct Unref {
+  void operator()(GdkPixbuf* picture) const { g_object_unref(picture); }
+};
+using Picture = std::unique_ptr<GdkPixbuf, Unref>;
+
+constexpr int kTolerance = 24;
+constexpr int kBitsPerSample = 8;
+
+void append32(std::string& bytes, unsigned value) {
+  for (int shift : {24, 16, 8, 0}) bytes += static_cast<char>(value >> shift);
+}
+
+bool endsWith(const std::string& text, const std::string& end) {
+  return text.size() >= end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
+}
+
+}  // namespace
+
+bool Colour::isAbout(const Colour& other) const {
+  return std::abs(red - other.red) <= kTolerance && std::abs(green - other.green) <= kTolerance &&
+         std::abs(blue - other.blue) <= kTolerance;
+}
+
+std::ostream& operator<<(std::ostream& out, const Colour& colour) {
+  return out << '(' << colour.red << ' ' << colour.green << ' ' << colour.blue << ')';
+}
+
+std::string makePicture(const Phone& phone, const std::string& name, const Colour& colour,
+                        int width, int height) {
+  const std::string path = phone.makeFile(name, 0);
+  const Picture picture(gdk_pixbuf_new(GDK_COLORSPACE_RGB, FALSE, kBitsPerSample, width, height));
+  gdk_pixbuf_fill(picture.get(), static_cast<guint32>(colour.red) << 24 |
+                                     static_cast<guint32>(colour.green) << 16 |
+                                     static_cast<guint32>(colour.blue) << 8 | 0xff);
+  EXPECT_TRUE(gdk_pixbuf_save(picture.get(), path.c_str(), endsWith(name, ".jpg") ? "jpeg" : "png",
+                              nullptr, nullptr));
+  return path;
+}
+
+std::string pngHeader(unsigned width, unsigned height) {
+  std::string bytes("\x89PNG\r\n\x1a\n\0\0\0\rIHDR", 16);
+  append32(bytes, width);
+  append32(bytes, height);
+  bytes += std::string("\x08\x02\0\0\0\0\0\0\0", 9);
+  return bytes;
+}
+
+Colour colourAt(const Phone& phone, int x, int y) {
+  const std::string file = phone.folder() + "/screen.png";
+  phone({"screenshot", file});
+  const Picture screen(gdk_pixbuf_new_from_file(file.c_str(), nullptr));
+  if (!screen || x < 0 || y < 0 || x >= gdk_pixbuf_get_width(screen.get()) ||
+      y >= gdk_pixbuf_get_height(screen.get())) {
+    return {};
+  }
+  const guchar* pixel = gdk_pixbuf_read_pixels(screen.get()) +
+                        y * gdk_pixbuf_get_rowstride(screen.get()) +
+                        x * gdk_pixbuf_get_n_channels(screen.get());
+  return {pixel[0], pixel[1], pixel[2]};
+}
+
+Colour colourOf(const Phone& phone, const std::string& name) {
+  const Tree tree = phone.tree();
+  const Widget* widget = tree.named(name);
+  if (!widget) return {};
+  return colourAt(phone, widget->area.x + widget->area.width / 2,
+                  widget->area.y + widget->area.height / 2);
+}
+
+}  // namespace phone

@@ -1,0 +1,35 @@
+/// Pictures to share, and what of them is to be seen on the screen.
+#pragma once
+
+#include <iosfwd>
+#include <string>
+
+#include "Phone.h"
+
+namespace phone {
+
+struct Colour {
+  int red = 0, green = 0, blue = 0;
+
+  /// Scaling and compression change a colour a little.
+  bool isAbout(const Colour& other) const;
+};
+
+std::ostream& operator<<(std::ostream& out, const Colour& colour);
+
+constexpr Colour kRed{220, 30, 40};
+constexpr Colour kGreen{30, 170, 60};
+constexpr Colour kBlue{40, 60, 210};
+
+/// A picture of one colour; its kind is that of the name's ending, jpg or png. Sizes in pixels.
+std::string makePicture(const Phone& phone, const std::string& name, const Colour& colour,
+                        int width = 320, int height = 320);
+/// A PNG file that claims to have this size and has no content.
+std::string pngHeader(unsigned width, unsigned height);
+
+/// The colour of one pixel of the screen.
+Colour colourAt(const Phone& phone, int x, int y);
+/// The colour in the middle of the first widget of that name; black when there is none.
+Colour colourOf(const Phone& phone, const std::string& name);
+
+}  // namespace phone
