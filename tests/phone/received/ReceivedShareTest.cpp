@@ -93,9 +93,8 @@ TEST_F(ReceivedShare, ShowsTheSendersNameFromTheAddressBook) {
 TEST_F(ReceivedShare, ShowsTheExpiredPageWhenItsTimeIsOver) {
   Phone& phone = thePhone();
   const Share share = phone.share(files(3), {"--expires-in", "1"});
-  phone({"shell", "sleep", "1.2"});  // the share's own clock
-  phone.launchReceived(share.token);
   EXPECT_TRUE(waitFor([&] {
+    phone.launchReceived(share.token);
     const Tree tree = phone.tree();
     return !tree.widgets().empty() && tree.items().empty() && !tree.enables("Download") &&
            tree.text().find(kSender) != std::string::npos;
