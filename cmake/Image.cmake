@@ -49,5 +49,6 @@ function(phone_image_file source target)
   add_custom_command(OUTPUT ${target} DEPENDS ${source} VERBATIM
     COMMAND ${CMAKE_COMMAND} -E make_directory ${folder}
     COMMAND ${CMAKE_COMMAND} -E rm -f ${target}
-    COMMAND ${CMAKE_COMMAND} -E copy ${source} ${target})
+    COMMAND ${CMAKE_COMMAND} -E copy ${source} ${target}
+    COMMAND chmod a+r ${target})  # the layout compiler's files are its user's alone
 endfunction()

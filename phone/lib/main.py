@@ -69,6 +69,9 @@ def main(args):
     except Failure as error:
         print(f"phone: {error}", file=sys.stderr)
         return 1
+    except PermissionError as error:
+        print(f"phone: {error.filename}: {error.strerror}", file=sys.stderr)
+        return 1
     except BrokenPipeError:
         os.dup2(os.open(os.devnull, os.O_WRONLY), 1)
         return 141
