@@ -11,7 +11,7 @@ class ZQVTimer {
   using Tick = std::function<bool()>;
 
   ZQVTimer() = default;
-  ~ZQVTimer() { stop(); }
+  ~ZQVTimer();
   ZQVTimer(const ZQVTimer&) = delete;
   ZQVTimer& operator=(const ZQVTimer&) = delete;
 
@@ -24,4 +24,5 @@ class ZQVTimer {
 
   Ecore_Timer* _timer = nullptr;
   Tick _tick;
+  bool* _gone = nullptr;  ///< told when this timer is destroyed by its own tick
 };

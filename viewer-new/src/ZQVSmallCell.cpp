@@ -30,6 +30,8 @@ Evas_Object* createCheck(const ZQViewerThumbnailItem* item, Evas_Object* grid) {
   // The check only shows the state: taps are for the cell.
   evas_object_repeat_events_set(check, EINA_TRUE);
   evas_object_propagate_events_set(check, EINA_FALSE);
+  // Registered without a function, which the toolkit ignores: a change is nobody's business here.
+  evas_object_smart_callback_add(check, "changed", nullptr, item);
   evas_object_show(check);
   return check;
 }

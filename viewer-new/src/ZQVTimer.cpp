@@ -2,6 +2,11 @@
 
 #include <utility>
 
+ZQVTimer::~ZQVTimer() {
+  stop();
+  if (_gone) *_gone = true;
+}
+
 void ZQVTimer::start(double seconds, Tick tick) {
   stop();
   _tick = std::move(tick);
@@ -18,10 +23,13 @@ void ZQVTimer::stop() {
 Eina_Bool ZQVTimer::_tickCb(void* data) {
   auto* self = static_cast<ZQVTimer*>(data);
   Ecore_Timer* running = self->_timer;
-  // The tick may start this timer anew or destroy it with its owner, so it runs from a copy, and a
-  // one-shot counts as stopped while it runs.
-  Tick tick = self->_tick;
-  if (tick()) return ECORE_CALLBACK_RENEW;
-  if (self->_timer == running) self->_timer = nullptr;
-  return ECORE_CALLBACK_CANCEL;
+  bool gone = false;
+  self->_gone = &gone;
+  // The tick may start this timer anew or destroy it with its owner, so it runs from a copy.
+  const Tick tick = self->_tick;
+  const bool again = tick();
+  if (gone) return ECORE_CALLBACK_CANCEL;
+  self->_gone = nullptr;
+  if (!again && self->_timer == running) self->_timer = nullptr;
+  return again;
 }

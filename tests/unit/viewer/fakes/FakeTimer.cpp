@@ -49,6 +49,10 @@ int FakeClock::running() {
   return static_cast<int>(entries().size());
 }
 
+ZQVTimer::~ZQVTimer() {
+  stop();
+}
+
 void ZQVTimer::start(double seconds, Tick tick) {
   stop();
   _tick = std::move(tick);
