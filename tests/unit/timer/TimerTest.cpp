@@ -12,7 +12,7 @@ constexpr double kSoon = 0.001;
 /// Runs the loop until `done` is true; the watchdog of the test runner ends what never comes.
 template <typename Done>
 void runUntil(Done done) {
-  while (!done()) ecore_main_loop_iterate_may_block(EINA_TRUE);
+  while (!done()) ecore_main_loop_iterate();
 }
 
 }  // namespace
