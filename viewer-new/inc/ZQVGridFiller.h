@@ -13,10 +13,11 @@ class ZQViewerThumbnailItem;
 class ZQVGridFiller {
  public:
   using Append = std::function<void(ZQViewerThumbnailItem* item)>;
+  using Filled = std::function<void()>;
 
   /// `items` is borrowed and must stay until the filling has ended or this object is gone. Null
-  /// entries are skipped.
-  void start(Eina_List* items, Append append);
+  /// entries are skipped. `filled`, which may be null, is called after the last one.
+  void start(Eina_List* items, Append append, Filled filled = nullptr);
   void stop() { _timer.stop(); }
   bool isRunning() const { return _timer.isRunning(); }
 
@@ -26,6 +27,7 @@ class ZQVGridFiller {
 
   Eina_List* _items = nullptr;
   Append _append;
+  Filled _filled;
   int _next = 0;
   ZQVTimer _timer;
 };

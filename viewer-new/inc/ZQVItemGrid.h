@@ -23,6 +23,9 @@ class ZQVItemGrid {
   void fitCells(Evas_Object* window);
   /// Null when the gengrid took no cell.
   Elm_Object_Item* append(ZQViewerThumbnailItem* item, Evas_Smart_Cb selected, void* data);
+  /// While cells come in batches the focus has to stay away: it would move on to the newest cell,
+  /// and the grid would scroll after it.
+  void keepFocusAway(bool isAway);
   void forgetCells();
 
   Evas_Object* get() const { return _grid; }

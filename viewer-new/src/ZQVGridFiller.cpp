@@ -13,16 +13,18 @@ constexpr double kBatchInterval = 0.01;
 
 }  // namespace
 
-void ZQVGridFiller::start(Eina_List* items, Append append) {
+void ZQVGridFiller::start(Eina_List* items, Append append, Filled filled) {
   stop();
   _items = items;
   _append = std::move(append);
+  _filled = std::move(filled);
   _next = 0;
   const int count = static_cast<int>(eina_list_count(_items));
   if (count > kMostAtOnce) {
     _timer.start(kBatchInterval, [this] { return _appendBatch(); });
   } else {
     _appendRange(0, count - 1);
+    if (_filled) _filled();
   }
 }
 
@@ -31,7 +33,9 @@ bool ZQVGridFiller::_appendBatch() {
   const int end = std::min(_next + kBatchStep, last);
   _appendRange(_next, end);
   _next = end + 1;
-  return _next <= last;
+  if (_next <= last) return true;
+  if (_filled) _filled();
+  return false;
 }
 
 void ZQVGridFiller::_appendRange(int first, int last) {

@@ -49,6 +49,10 @@ Elm_Object_Item* ZQVItemGrid::append(ZQViewerThumbnailItem* item, Evas_Smart_Cb 
   return cell;
 }
 
+void ZQVItemGrid::keepFocusAway(bool isAway) {
+  if (_grid) elm_object_focus_allow_set(_grid, !isAway);
+}
+
 void ZQVItemGrid::forgetCells() {
   const Eina_List* node = nullptr;
   void* data = nullptr;

@@ -77,8 +77,10 @@ Evas_Object* ZQVReceiverView::onCreateView(Evas_Object* parent, void*) {
 }
 
 void ZQVReceiverView::onCreated() {
-  _filler.start(_items,
-                [this](ZQViewerThumbnailItem* item) { _grid.append(item, _gridItemCb, this); });
+  _grid.keepFocusAway(true);
+  _filler.start(
+      _items, [this](ZQViewerThumbnailItem* item) { _grid.append(item, _gridItemCb, this); },
+      [this] { _grid.keepFocusAway(false); });
 }
 
 Elm_Object_Item* ZQVReceiverView::onPushToNaviframe(Evas_Object* naviframe) {

@@ -111,9 +111,13 @@ void ZQVSenderView::onCreated() {
     ZQV_ERROR("_thumbList is NULL");
     return;
   }
-  _filler.start(_items, [this](ZQViewerThumbnailItem* item) {
-    if (_grid.get()) _grid.append(item, _gridItemCb, this);
-  });
+  _grid.keepFocusAway(true);
+  _filler.start(
+      _items,
+      [this](ZQViewerThumbnailItem* item) {
+        if (_grid.get()) _grid.append(item, _gridItemCb, this);
+      },
+      [this] { _grid.keepFocusAway(false); });
 }
 
 Elm_Object_Item* ZQVSenderView::onPushToNaviframe(Evas_Object* naviframe) {
