@@ -8,6 +8,7 @@
 #include <cerrno>
 #include <cstring>
 
+#include "ZQVAccess.h"
 #include "ZQVCellParts.h"
 #include "ZQVCommon.h"
 #include "ZQVIcons.h"
@@ -131,7 +132,10 @@ void ZQVThumbnailFetcher::_readContentInfo(zelqo_share_h handle, int serviceInde
   replaceText(&item->downloadUrl, result == ZELQO_ERROR_NONE ? url.get() : nullptr);
   const ZQVOwnedText icon(ZQVIcons::_getOthersIconPath(item->mimeType, true));
   if (icon) replaceText(&item->thumbPath, icon.get());
-  if (isDownloaded(item)) item->downloadStatus = ZQV_DOWNLOADED;
+  if (!isDownloaded(item)) return;
+  item->downloadStatus = ZQV_DOWNLOADED;
+  // The cell got its name before.
+  zqvSetAccessibleName(item->gridItems[ZQV_VIEW_RECEIVER], zqvCellName(*item));
 }
 
 void ZQVThumbnailFetcher::_reuseThumbnail(ZQViewerThumbnailItem* item, Urls* missing) {
