@@ -50,7 +50,8 @@ def _connect(state):
 def send(connection, message, files=()):
     data = json.dumps(message).encode() + b"\n"
     sent = socket.send_fds(connection, [data], list(files)) if files else 0
-    connection.sendall(data[sent:])
+    if sent < len(data):  # sending nothing fails when the answer came at once
+        connection.sendall(data[sent:])
 
 
 def receive(connection):

@@ -2,6 +2,7 @@
 
 import os
 import subprocess
+import threading
 
 from lib.report import Failure
 
@@ -13,6 +14,7 @@ class Sharing:
         self._phone = phone
         self._service = None
         self._agent = None
+        self._changing = threading.Lock()
         self.url = phone.settings["service"]
 
     def start(self):
@@ -31,6 +33,10 @@ class Sharing:
             raise Failure("this phone uses another phone's service")
         if not self.url:
             raise Failure("the sharing service was not built")
+        with self._changing:
+            self._restart(mode, delay)
+
+    def _restart(self, mode, delay):
         if self._service:
             self._service.end()
             self._phone.programs.remove(self._service)
