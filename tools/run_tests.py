@@ -14,6 +14,7 @@ import time
 ROOT = os.path.dirname(os.path.dirname(os.path.abspath(__file__)))
 PHONE = os.path.join(ROOT, "phone", "phone")
 PATIENCE = 300        # seconds for one program
+LAST_LINES = 40
 SANITIZER_FACTOR = 4  # how much slower programs may be under the sanitizers
 
 
@@ -34,6 +35,12 @@ class Program:
         self.path, *self.arguments = entry["command"]
         self.outside = "phone" in properties.get("LABELS", [])
         self.patience = properties.get("TIMEOUT", PATIENCE)
+
+
+def end(output, status):
+    """The last lines of a program that did not come to its end."""
+    how = "it took too long" if status is None else f"it ended with status {status}"
+    return "\n".join(output.splitlines()[-LAST_LINES:] + [how])
 
 
 class Result:
@@ -66,6 +73,8 @@ class Runner:
         os.environ["PHONE_BUILD"] = self.build
         suppressions = os.path.join(ROOT, "tests", "leaks.supp")
         os.environ.setdefault("LSAN_OPTIONS", f"suppressions={suppressions}:print_suppressions=0")
+        # Whole stacks, or the suppressions do not see which library it was.
+        os.environ.setdefault("ASAN_OPTIONS", "fast_unwind_on_malloc=0")
         os.environ.setdefault("UBSAN_OPTIONS", "print_stacktrace=1:halt_on_error=1")
 
     def command(self, program, extra):
@@ -109,7 +118,7 @@ class Runner:
         except subprocess.TimeoutExpired:
             os.killpg(process.pid, signal.SIGTERM)
             output, _ = process.communicate()
-            return None, f"{output}\nended after {patience:.0f} s without a result"
+            return None, output
 
     @staticmethod
     def judge(report, status, output):
@@ -119,14 +128,16 @@ class Runner:
         except (OSError, ValueError):
             if status == 0 and "[==========]" not in output:
                 return Result(passed=1)  # a program that is one test
-            return Result(failed=1, output=output + f"\nended with status {status}")
+            return Result(failed=1, output=end(output, status))
         cases = [case for suite in summary["testsuites"] for case in suite["testsuite"]]
+        told = [f"{case['classname']}.{case['name']}:\n{failure['failure']}"
+                for case in cases for failure in case.get("failures", [])]
         failed = sum("failures" in case for case in cases)
         skipped = sum(case["result"] == "SKIPPED" for case in cases)
         ran = sum(case["status"] == "RUN" for case in cases)
         if status != 0 and failed == 0:  # it broke on its way out
-            return Result(ran - skipped, 1, skipped, output + f"\nended with status {status}")
-        return Result(ran - failed - skipped, failed, skipped, output if failed else "")
+            return Result(ran - skipped, 1, skipped, end(output, status))
+        return Result(ran - failed - skipped, failed, skipped, "\n".join(told))
 
     def phone_command(self, *words):
         return subprocess.run([PHONE, "--state", self.phone, *words]).returncode
