@@ -25,6 +25,19 @@ testing::AssertionResult result(bool came, const std::string& what) {
   return testing::AssertionFailure() << what << " on\n" << thePhone().tree();
 }
 
+// The place of the page that fills the pager, from 1; 0 while none does.
+size_t pageNumberOn(const Tree& tree) {
+  const Widget* pager = nullptr;
+  for (const Widget& widget : tree.widgets()) {
+    if (widget.role == "tree table" && widget.is("showing")) pager = &widget;
+  }
+  const std::vector<Widget> pages = tree.items();
+  for (size_t i = 0; pager && i < pages.size(); i++) {
+    if (pages[i].is("showing") && isSame(pages[i].area, pager->area)) return i + 1;
+  }
+  return 0;
+}
+
 testing::AssertionResult buttonIs(const std::string& name, const std::string& state) {
   const bool came = waitFor([&] {
     const Tree tree = thePhone().tree();
@@ -40,6 +53,7 @@ void tapCell(const std::string& name) {
   ASSERT_TRUE(comes(name));
   thePhone()({"tap", name});
   ASSERT_TRUE(pageIs(name));
+  thePhone()({"painted"});  // a page that is still coming in takes no input
 }
 
 }  // namespace
@@ -75,15 +89,13 @@ void openSent(const Words& files, const std::string& cell) {
 }
 
 std::string pageOn(const Tree& tree) {
-  const Widget* pager = nullptr;
-  for (const Widget& widget : tree.widgets()) {
-    if (widget.role == "tree table" && widget.is("showing")) pager = &widget;
-  }
-  if (!pager) return {};
-  for (const Widget& widget : tree.items()) {
-    if (widget.is("showing") && isSame(widget.area, pager->area)) return widget.name;
-  }
-  return {};
+  const size_t number = pageNumberOn(tree);
+  return number ? tree.items()[number - 1].name : "";
+}
+
+testing::AssertionResult pageNumberIs(size_t number) {
+  return result(waitFor([&] { return pageNumberOn(thePhone().tree()) == number; }),
+                "not page " + std::to_string(number));
 }
 
 testing::AssertionResult pageIs(const std::string& name) {

@@ -27,6 +27,9 @@ std::string pageOn(const phone::Tree& tree);
 /// Waits until that file is the page and nothing moves any more.
 testing::AssertionResult pageIs(const std::string& name);
 
+/// The same by its place, from 1.
+testing::AssertionResult pageNumberIs(size_t number);
+
 void swipeForth();
 void swipeBack();
 
