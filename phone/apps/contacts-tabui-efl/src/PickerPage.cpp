@@ -1,5 +1,6 @@
 #include "PickerPage.h"
 
+#include <companion/CompanionApp.h>
 #include <companion/Text.h>
 #include <zelqo/PhoneSettings.h>
 
@@ -40,7 +41,7 @@ companion::Row PickerPage::row(companion::RowKey key) {
   companion::Row row;
   row.title = entry.name;
   row.detail = entry.number;
-  row.icon = entry.picture;
+  row.icon = entry.picture.empty() ? companion::imageFile("person.png") : entry.picture;
   row.checked = _selected.count(entry.number) > 0;
   return row;
 }
