@@ -91,6 +91,7 @@ def _keep(state, settings, unboxed, told):
         os.close(told)
         for number in (signal.SIGTERM, signal.SIGINT, signal.SIGHUP):
             signal.signal(number, lambda *_: supervisor.terminate())
+        _end_with(settings["while"], supervisor)
         status = supervisor.wait()
     except OSError as error:
         try:
@@ -103,6 +104,25 @@ def _keep(state, settings, unboxed, told):
             _reap()
             sandbox.Machine.give_back(state)
         os._exit(status & 0xFF)
+
+
+def _end_with(pid, supervisor):
+    """The phone goes down when the process that it is for has gone."""
+    if not pid:
+        return
+    import select
+    import threading
+    try:
+        process = os.pidfd_open(pid)
+    except OSError:
+        supervisor.terminate()
+        return
+
+    def watch():
+        select.select([process], [], [])
+        supervisor.terminate()
+
+    threading.Thread(target=watch, daemon=True).start()
 
 
 def _reap():

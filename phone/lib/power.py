@@ -9,17 +9,18 @@ from lib.report import Failure, Usage
 from lib.state import find_build
 
 _UP = ("phone up [--headless] [--screen WxH] [--lang LOCALE] [--number N] [--service URL] "
-       "[--build DIR]")
+       "[--build DIR] [--while PID]")
 
 
 def up(state, args):
-    options = parse(args, values=("screen", "lang", "number", "service", "build"),
+    options = parse(args, values=("screen", "lang", "number", "service", "build", "while"),
                     flags=("headless",), usage=_UP)
     settings = {
         "screen": _screen(options.get("screen", "720x1280")),
         "language": locale(options.get("lang", "en_US.UTF-8")),
         "number": _subscriber(options.get("number", "+821012345678")),
         "service": options.get("service"),
+        "while": number(options.get("while", "0"), "--while", 0),
         "build": find_build(options.get("build")),
         "display": None if options.get("headless") else os.environ.get("DISPLAY") or _no_display(),
     }

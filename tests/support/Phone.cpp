@@ -1,6 +1,7 @@
 #include "Phone.h"
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <filesystem>
 #include <fstream>
@@ -32,9 +33,10 @@ std::string valueAfter(const std::string& text, const std::string& label) {
 Phone::Phone(const std::string& name, const Words& upOptions, const Words& environment)
     : _folder(std::string(BUILD_DIR) + "/phones/" + name), _environment(environment) {
   _environment.push_back(std::string("PHONE_BUILD=") + BUILD_DIR);
-  command({"down"});  // of a test that was interrupted
+  while (command({"status"}).status == 0) _folder += "-";  // the same program runs elsewhere, too
   fs::remove_all(_folder);
-  const Output output = command(joined({"up", "--headless"}, upOptions));
+  const Output output =
+      command(joined({"up", "--headless", "--while", std::to_string(getpid())}, upOptions));
   _isUp = output.status == 0;
   EXPECT_EQ(output.status, 0) << output.err;
 }

@@ -8,8 +8,8 @@
 #include <cctype>
 #include <filesystem>
 #include <fstream>
-#include <iterator>
 #include <regex>
+#include <sstream>
 
 #include "Phone.h"
 
@@ -33,8 +33,9 @@ std::vector<int> processesOf(const std::string& folder) {
     if (!isdigit(static_cast<unsigned char>(name[0])) || std::stoi(name) == getpid()) continue;
     for (const char* file : {"cmdline", "environ"}) {
       std::ifstream source(entry.path() / file, std::ios::binary);
-      const std::string text(std::istreambuf_iterator<char>(source), {});
-      if (text.find(folder) == std::string::npos) continue;
+      std::ostringstream text;
+      text << source.rdbuf();  // which reads nothing of a process that has just ended
+      if (text.str().find(folder) == std::string::npos) continue;
       found.push_back(std::stoi(name));
       break;
     }
@@ -92,7 +93,9 @@ std::vector<int> processesOf(const std::string& folder, const std::string& comma
   std::vector<int> found;
   for (const int pid : processesOf(folder)) {
     std::ifstream source("/proc/" + std::to_string(pid) + "/cmdline", std::ios::binary);
-    std::string line(std::istreambuf_iterator<char>(source), {});
+    std::ostringstream text;
+    text << source.rdbuf();
+    std::string line = text.str();
     std::replace(line.begin(), line.end(), '\0', ' ');
     if (std::regex_search(line, std::regex(command))) found.push_back(pid);
   }
@@ -112,6 +115,18 @@ TEST(PhoneDown, HappensAlsoWhenAnyOfItsProcessesIsKilled) {
     EXPECT_TRUE(phone::waitFor([&] { return processesOf(phone.folder()).empty(); }));
     EXPECT_EQ(phone.command({"up", "--headless"}).status, 0);
   }
+}
+
+TEST(PhoneDown, HappensWhenTheProcessThatThePhoneIsForHasGone) {
+  if (!sandboxed()) GTEST_SKIP() << "without a sandbox there is one phone at a time";
+  Phone phone("for-another");
+  phone({"down"});
+  const std::string command = SOURCE_DIR "/phone/phone --state " + phone.folder();
+  const Output output = phone::run({"sh", "-c",
+                                    "exec 2>&1; " + command + " up --headless --while $$ && " +
+                                        command + " status >/dev/null && echo was up"});
+  EXPECT_EQ(output.out, "was up\n");
+  EXPECT_TRUE(phone::waitFor([&] { return processesOf(phone.folder()).empty(); }));
 }
 
 struct WrongCall {
