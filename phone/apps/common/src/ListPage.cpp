@@ -100,6 +100,7 @@ void ListPage::setHeader(const std::string& summary, std::optional<double> progr
   _show("header", !summary.empty());
   _show("progress", progress.has_value());
   elm_progressbar_value_set(_progress, progress.value_or(0));
+  setAccessibleName(_progress, std::string(text("Progress")) + " " + summary);
 }
 
 void ListPage::setEmptyText(const std::string& emptyText) {

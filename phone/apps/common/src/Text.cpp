@@ -9,6 +9,13 @@
 #include <cstdlib>
 
 namespace companion {
+namespace {
+
+// The viewer counts like this too: one file has one size on all pages.
+constexpr unsigned kKilobyte = 1024;
+constexpr unsigned kMegabyte = 1024 * kKilobyte;
+
+}  // namespace
 
 const char* text(const char* id) {
   return dgettext(appfw::applicationId().c_str(), id);
@@ -26,8 +33,10 @@ std::string format(const char* id, ...) {
 }
 
 std::string sizeText(unsigned long long bytes) {
-  const base::OwnedText size(g_format_size(bytes));
-  return size.get();
+  if (bytes < kKilobyte) return format("%llu B", bytes);
+  const auto size = static_cast<double>(bytes);
+  if (bytes < kMegabyte) return format("%.1f KB", size / kKilobyte);
+  return format("%.1f MB", size / kMegabyte);
 }
 
 std::string escape(const std::string& plain) {
