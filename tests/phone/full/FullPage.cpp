@@ -63,7 +63,7 @@ void FullPage::TearDown() {
   thePhone()({"network", "wifi"});
   thePhone()({"rotate", "0"});
   thePhone().closeViewer();
-  thePhone()({"shell", "sh", "-c", "p=$(pidof gpicview l3afpad mpv zathura) && kill $p; true"});
+  closePrograms();
   for (const auto& file : fs::directory_iterator(ofPhone("/opt/usr/media/Downloads"))) {
     fs::remove_all(file);
   }
@@ -103,12 +103,13 @@ testing::AssertionResult pageIs(const std::string& name) {
                 "\"" + name + "\" is not the page");
 }
 
+// Far enough to turn the page however slow the machine is.
 void swipeForth() {
-  thePhone()({"swipe", "600,640", "200,640", "150"});
+  thePhone()({"swipe", "690,640", "70,640", "250"});
 }
 
 void swipeBack() {
-  thePhone()({"swipe", "120,640", "520,640", "150"});
+  thePhone()({"swipe", "30,640", "650,640", "250"});
 }
 
 testing::AssertionResult buttonIsEnabled(const std::string& name) {
@@ -122,6 +123,11 @@ testing::AssertionResult buttonIsDisabled(const std::string& name) {
 testing::AssertionResult download() {
   const testing::AssertionResult tapped = tap("Download");
   return tapped ? buttonIsEnabled("Open") : tapped;
+}
+
+bool closePrograms() {
+  const char* end = "p=$(pidof gpicview l3afpad mpv zathura) && kill $p";
+  return thePhone().command({"shell", "sh", "-c", end}).status == 0;
 }
 
 size_t countOf(const std::string& text, const std::string& part) {

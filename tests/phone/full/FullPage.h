@@ -40,6 +40,9 @@ testing::AssertionResult buttonIsDisabled(const std::string& name);
 /// Downloads the file on screen from here.
 testing::AssertionResult download();
 
+/// Ends the programs that show files; false when there was none.
+bool closePrograms();
+
 size_t countOf(const std::string& text, const std::string& part);
 /// Does a tap on Open bring one more message that no application was found?
 testing::AssertionResult openIsRefused();

@@ -1,6 +1,7 @@
 // The pages of a sent share: its files are opened, never downloaded.
 
 #include <filesystem>
+#include <fstream>
 
 #include "FullPage.h"
 
@@ -27,22 +28,34 @@ TEST_F(SentPages, OfferToOpenAFileThatIsOnThePhone) {
   }));
 }
 
-TEST_F(SentPages, OfferNothingForAFileThatIsMissing) {
+TEST_F(SentPages, OfferNothingForAFileThatOnlyTheServiceKeeps) {
+  const std::string held = "/opt/usr/apps/com.orlant.zelqo/shared/data/Held.txt";
+  std::ofstream(ofPhone(held)) << "content";
+  const std::string own = thePhone().makeFile("Own.txt");
+  thePhone()({"launch", "raw", "launch_viewer", "freemsg_send_data[]=" + held,
+              "freemsg_send_data[]=" + own});
+  ASSERT_TRUE(tap("Own.txt"));
+  ASSERT_TRUE(pageIs("Own.txt"));
+  thePhone()({"painted"});
+  EXPECT_TRUE(buttonIsEnabled("Open"));
+  swipeBack();
+  ASSERT_TRUE(pageIs("Held.txt"));
+  EXPECT_TRUE(buttonIsDisabled("Open"));
+  swipeForth();
+  ASSERT_TRUE(pageIs("Own.txt"));
+  EXPECT_TRUE(buttonIsEnabled("Open"));
+  fs::remove(ofPhone(held));
+}
+
+TEST_F(SentPages, LeaveOutAFileThatIsMissing) {
   const std::string gone = thePhone().makeFile("Gone.txt");
   const std::string kept = thePhone().makeFile("Kept.txt");
   const phone::Share share = thePhone().shareTo("+821011112222", "+821012345678", {gone, kept});
   fs::remove(gone);
   thePhone()({"launch", "sent", "--request", std::to_string(share.request)});
   ASSERT_TRUE(tap("Kept.txt"));
-  ASSERT_TRUE(pageIs("Kept.txt"));
-  thePhone()({"painted"});
-  EXPECT_TRUE(buttonIsEnabled("Open"));
-  swipeBack();
-  ASSERT_TRUE(pageIs("Gone.txt"));
-  EXPECT_TRUE(buttonIsDisabled("Open"));
-  swipeForth();
-  ASSERT_TRUE(pageIs("Kept.txt"));
-  EXPECT_TRUE(buttonIsEnabled("Open"));
+  EXPECT_TRUE(pageIs("Kept.txt"));
+  EXPECT_EQ(thePhone().tree().items().size(), 1u) << thePhone().tree();
 }
 
 TEST_F(SentPages, KeepTheButtonsTextWhenTheLanguageChanges) {
