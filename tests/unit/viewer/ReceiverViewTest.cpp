@@ -3,6 +3,7 @@
 
 #include "PageTest.h"
 #include "ZQVReceiverView.h"
+#include "ZQVText.h"
 
 namespace {
 
@@ -197,9 +198,9 @@ TEST_F(ReceiverView, OpensNothingWithoutANetwork) {
   show();
   click(toolbarButton());
   EXPECT_EQ(pages(), Errors({"ZQVReceiverView"}));
-  EXPECT_EQ(
-      platform().messages,
-      Errors({"IDS_MF_POP_MOBILE_DATA_IS_TURNED_OFF_CONNECT_TO_A_WI_FI_NETWORK_INSTEAD_MSG"}));
+  EXPECT_EQ(platform().messages,
+            Errors({zqvText(
+                "IDS_MF_POP_MOBILE_DATA_IS_TURNED_OFF_CONNECT_TO_A_WI_FI_NETWORK_INSTEAD_MSG")}));
   EXPECT_EQ(errors(), Errors({"No network"}));
 }
 
