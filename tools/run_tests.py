@@ -139,6 +139,9 @@ class Runner:
                 os.killpg(process.pid, signal.SIGKILL)
                 output, _ = process.communicate()
             return None, output
+        except BaseException:  # interrupted: nothing is left running
+            os.killpg(process.pid, signal.SIGTERM)
+            raise
 
     @staticmethod
     def judge(report, status, output):
@@ -194,6 +197,7 @@ class Runner:
 
 def main():
     options = arguments()
+    signal.signal(signal.SIGTERM, lambda *_: sys.exit(143))
     total = Runner(options).run_all()
     print(f"{total.passed} passed, {total.failed} failed")
     return 1 if total.failed or not total.passed else 0
