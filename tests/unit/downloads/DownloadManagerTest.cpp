@@ -228,6 +228,7 @@ TEST_F(Manager, GoesOnWhereTheLineBrokeWhenItIsTriedAgain) {
   fetch("/1", "a.bin", 1000000);
   ASSERT_TRUE(waitForEnd());
   ASSERT_EQ(last().state, State::Failed);
+  EXPECT_EQ(last().failure, Failure::Network);
   server["/1"].isCutOff = false;
   manager->retry(last().id);
   ASSERT_TRUE(waitForEnd());

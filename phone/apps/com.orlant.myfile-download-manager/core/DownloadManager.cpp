@@ -180,7 +180,7 @@ void DownloadManager::_finish(Download& download) {
 }
 
 void DownloadManager::_fail(Download& download, Failure failure) {
-  if (!leavesUsefulPart(failure)) {
+  if (!leavesUsefulPart(failure) || sizeOnDisk(_partPath(download)) == 0) {
     unlink(_partPath(download).c_str());
     download.etag.clear();
   }

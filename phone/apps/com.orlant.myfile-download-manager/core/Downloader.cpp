@@ -20,8 +20,6 @@ Failure failureOfStatus(unsigned int status) {
 Failure failureOfError(const GError* error) {
   // A redirect loop, or something that is not HTTP.
   if (error->domain == SOUP_SESSION_ERROR) return Failure::Refused;
-  // The body ended before the length that its head promised.
-  if (g_error_matches(error, G_IO_ERROR, G_IO_ERROR_PARTIAL_INPUT)) return Failure::WrongSize;
   return Failure::Network;
 }
 

@@ -31,6 +31,13 @@ Total totalOf(const std::vector<const Download*>& list) {
   return total;
 }
 
+// A stored file goes by the name under which it is found, which may have got a number.
+std::string titleOf(const Download& download) {
+  const std::size_t slash = download.path.rfind('/');
+  if (download.state != State::Done || slash == std::string::npos) return safeName(download.name);
+  return download.path.substr(slash + 1);
+}
+
 }  // namespace
 
 DownloadPage::DownloadPage(DownloadManager& manager, GoneHandler onGone)
@@ -105,7 +112,7 @@ companion::Row DownloadPage::row(companion::RowKey key) {
   companion::Row row;
   const Download* download = _manager.find(key);
   if (!download) return row;
-  row.title = safeName(download->name);
+  row.title = titleOf(*download);
   row.detail = detailOf(*download, _manager.isHeldBack(*download));
   if (download->isPending()) {
     row.progress = download->size == 0 ? 0.0
