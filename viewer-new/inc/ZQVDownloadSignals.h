@@ -34,5 +34,6 @@ class ZQVDownloadSignals {
   GDBusConnection* _bus = nullptr;
   guint _downloading = 0;
   guint _downloaded = 0;
+  guint _failed = 0;
   Handler _handler;
 };

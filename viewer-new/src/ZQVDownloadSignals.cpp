@@ -12,6 +12,8 @@ constexpr const char* kInterface = "org.tizen.call.remote.share";
 constexpr const char* kPath = "/com/orlant/remoteshare";
 constexpr const char* kDownloading = "file_downloading";
 constexpr const char* kDownloaded = "file_downloaded";
+// Failed or cancelled: the user may ask for the file again.
+constexpr const char* kFailed = "file_failed";
 
 }  // namespace
 
@@ -26,9 +28,11 @@ void ZQVDownloadSignals::start(Handler handler) {
   }
   _downloading = _subscribe(kDownloading);
   _downloaded = _subscribe(kDownloaded);
+  _failed = _subscribe(kFailed);
 }
 
 void ZQVDownloadSignals::stop() {
+  _unsubscribe(_failed);
   _unsubscribe(_downloaded);
   _unsubscribe(_downloading);
   g_clear_object(&_bus);

@@ -313,6 +313,16 @@ TEST_F(DownloadSignals, FollowADownloadInItsCell) {
   EXPECT_EQ(items[0].downloadStatus, ZQV_NOT_DOWNLOADED);
 }
 
+TEST_F(DownloadSignals, OfferAFileAgainWhoseDownloadFailed) {
+  items.addCount(1);
+  show();
+  emit("file_downloading", items[0].downloadUrl);
+  EXPECT_TRUE(waitUntil([&] { return !isDownloadEnabled(); }));
+  emit("file_failed", items[0].downloadUrl);
+  EXPECT_TRUE(waitForStatus(0, ZQV_NOT_DOWNLOADED));
+  EXPECT_TRUE(waitUntil([&] { return isDownloadEnabled(); }));
+}
+
 TEST_F(DownloadSignals, DisableTheButtonWhileEverythingIsOnItsWay) {
   items.addCount(2);
   show();
