@@ -3,19 +3,26 @@
 phone of its own. Ends with "N passed, N failed"."""
 
 import argparse
+import concurrent.futures
+import contextlib
 import json
 import os
 import re
 import signal
 import subprocess
 import sys
+import threading
 import time
 
 ROOT = os.path.dirname(os.path.dirname(os.path.abspath(__file__)))
+sys.path.insert(0, os.path.join(ROOT, "phone"))
+from lib import sandbox  # noqa: E402
+
 PHONE = os.path.join(ROOT, "phone", "phone")
 PATIENCE = 300        # seconds for one program
 LAST_LINES = 40
 SANITIZER_FACTOR = 4  # how much slower programs may be under the sanitizers
+AT_A_TIME = 2         # phones outside the one of the unit tests
 
 
 def arguments():
@@ -71,6 +78,10 @@ class Runner:
         self.phone = os.path.join(self.build, "phones", "unit")
         self.results = os.path.join(self.build, "test-results")
         os.makedirs(self.results, exist_ok=True)
+        self.first = []  # what each program gave at the first try
+        self.telling = threading.Lock()
+        self.running = set()
+        self.stopping = False
         os.environ["PHONE_BUILD"] = self.build
         suppressions = os.path.join(ROOT, "tests", "leaks.supp")
         os.environ.setdefault("LSAN_OPTIONS", f"suppressions={suppressions}:print_suppressions=0")
@@ -82,9 +93,9 @@ class Runner:
         words = [program.path] + program.arguments + extra
         return words if program.outside else [PHONE, "--state", self.phone, "shell"] + words
 
-    def filter(self, program):
+    def filter(self, program, only):
         """The arguments that choose the wanted tests; None when there are none."""
-        if self.only.search(program.name):
+        if only.search(program.name):
             return []
         listed = subprocess.run(self.command(program, ["--gtest_list_tests"]), text=True,
                                 stdout=subprocess.PIPE, stderr=subprocess.DEVNULL).stdout
@@ -93,12 +104,12 @@ class Runner:
             name = line.split("#")[0].strip()
             if not line.startswith(" "):
                 suite = name
-            elif self.only.search(suite + name):
+            elif only.search(suite + name):
                 wanted.append(suite + name)
         return ["--gtest_filter=" + ":".join(wanted)] if wanted else None
 
-    def run(self, program):
-        chosen = self.filter(program)
+    def run(self, program, only):
+        chosen = self.filter(program, only)
         if chosen is None:
             return None
         report = os.path.join(self.results, program.name + ".json")
@@ -109,25 +120,21 @@ class Runner:
         return self.judge(report, status, output)
 
     def run_again(self, program, first):
-        """A phone on a busy machine may miss a moment: what failed is tried once more, and said."""
-        print(f"{program.name}: {first}, tried once more: {' '.join(first.names) or 'all'}\n"
-              f"{first.output.rstrip()}", flush=True)
+        """A phone on a busy machine may miss a moment: what failed is tried once more, alone."""
         if not first.names:
-            return self.run(program)
-        only, self.only = self.only, re.compile("|".join(f"^{re.escape(name)}$"
-                                                         for name in first.names))
-        second = self.run(program)
-        self.only = only
+            return self.run(program, self.only)
+        names = re.compile("|".join(f"^{re.escape(name)}$" for name in first.names))
+        second = self.run(program, names)
         if second is None or second.passed + second.failed < len(first.names):
             return first
         return Result(first.passed + second.passed, second.failed, first.skipped, second.output,
                       second.names)
 
-    @staticmethod
-    def watch(words, patience):
+    def watch(self, words, patience):
         process = subprocess.Popen(words, stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
                                    stderr=subprocess.STDOUT, text=True, errors="replace",
                                    start_new_session=True)
+        self.running.add(process)
         try:
             output, _ = process.communicate(timeout=patience)
             return process.returncode, output
@@ -139,9 +146,8 @@ class Runner:
                 os.killpg(process.pid, signal.SIGKILL)
                 output, _ = process.communicate()
             return None, output
-        except BaseException:  # interrupted: nothing is left running
-            os.killpg(process.pid, signal.SIGTERM)
-            raise
+        finally:
+            self.running.discard(process)
 
     @staticmethod
     def judge(report, status, output):
@@ -167,40 +173,84 @@ class Runner:
         return subprocess.run([PHONE, "--state", self.phone, *words]).returncode
 
     def run_all(self):
-        total = Result()
+        """Phones wait more than they work, so several are up at a time."""
         wanted = programs(self.build)
         inside = [program for program in wanted if not program.outside]
-        if inside:
-            if self.phone_command("up", "--headless") != 0:
-                return Result(failed=1)
-            try:
-                self.run_these(inside, total)
-            finally:
-                self.phone_command("down")
-        self.run_these([program for program in wanted if program.outside], total)
-        return total
+        outside = [program for program in wanted if program.outside]
+        if sandbox.why_not():  # there can be only one phone
+            self.run_inside(inside)
+            for program in outside:
+                self.run_first(program)
+        else:
+            with concurrent.futures.ThreadPoolExecutor(AT_A_TIME) as pool:
+                waiting = [pool.submit(self.run_first, program) for program in outside]
+                self.run_inside(inside)
+                for one in waiting:
+                    one.result()
+        return self.total()
 
-    def run_these(self, some, total):
-        for program in some:
-            begin = time.monotonic()
-            result = self.run(program)
-            if result is None:
-                continue
-            if result.failed:
-                result = self.run_again(program, result)
+    def run_inside(self, some):
+        if not some:
+            return
+        with self.unit_phone():
+            for program in some:
+                self.run_first(program)
+
+    @contextlib.contextmanager
+    def unit_phone(self):
+        if self.phone_command("up", "--headless") != 0:
+            print("There is no phone for the unit tests")
+        try:
+            yield
+        finally:
+            self.phone_command("down")
+
+    def run_first(self, program):
+        if self.stopping:
+            return
+        begin = time.monotonic()
+        result = self.run(program, self.only)
+        if result is not None:
+            self.first.append((program, result))
+            self.tell(program, result, begin)
+
+    def second_try(self, program, first):
+        print(f"{program.name}: once more, {' '.join(first.names) or 'all'}", flush=True)
+        begin = time.monotonic()
+        with contextlib.nullcontext() if program.outside else self.unit_phone():
+            result = self.run_again(program, first) or first
+        self.tell(program, result, begin)
+        return result
+
+    def tell(self, program, result, begin):
+        with self.telling:
             print(f"{program.name}: {result} ({time.monotonic() - begin:.1f} s)", flush=True)
             if result.failed:
                 print(result.output.rstrip(), flush=True)
+
+    def total(self):
+        total = Result()
+        for program, result in self.first:
+            if result.failed and not self.stopping:
+                result = self.second_try(program, result)
             total.passed += result.passed
             total.failed += result.failed
+        return total
+
+    def stop(self, *_):
+        """Interrupted: nothing is left running."""
+        self.stopping = True
+        for process in list(self.running):
+            os.killpg(process.pid, signal.SIGTERM)
 
 
 def main():
-    options = arguments()
-    signal.signal(signal.SIGTERM, lambda *_: sys.exit(143))
-    total = Runner(options).run_all()
+    runner = Runner(arguments())
+    signal.signal(signal.SIGTERM, runner.stop)
+    signal.signal(signal.SIGINT, runner.stop)
+    total = runner.run_all()
     print(f"{total.passed} passed, {total.failed} failed")
-    return 1 if total.failed or not total.passed else 0
+    return 1 if total.failed or not total.passed or runner.stopping else 0
 
 
 if __name__ == "__main__":
