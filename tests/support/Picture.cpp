@@ -33,6 +33,10 @@ bool Colour::isAbout(const Colour& other) const {
          std::abs(blue - other.blue) <= kTolerance;
 }
 
+bool Colour::operator==(const Colour& other) const {
+  return red == other.red && green == other.green && blue == other.blue;
+}
+
 std::ostream& operator<<(std::ostream& out, const Colour& colour) {
   return out << '(' << colour.red << ' ' << colour.green << ' ' << colour.blue << ')';
 }
@@ -57,18 +61,31 @@ std::string pngHeader(unsigned width, unsigned height) {
   return bytes;
 }
 
-Colour colourAt(const Phone& phone, int x, int y) {
+std::string pixelsOf(const Phone& phone, const Area& area) {
   const std::string file = phone.folder() + "/screen.png";
   phone({"screenshot", file});
   const Picture screen(gdk_pixbuf_new_from_file(file.c_str(), nullptr));
-  if (!screen || x < 0 || y < 0 || x >= gdk_pixbuf_get_width(screen.get()) ||
-      y >= gdk_pixbuf_get_height(screen.get())) {
+  if (!screen || area.x < 0 || area.y < 0 || area.right() > gdk_pixbuf_get_width(screen.get()) ||
+      area.bottom() > gdk_pixbuf_get_height(screen.get())) {
     return {};
   }
-  const guchar* pixel = gdk_pixbuf_read_pixels(screen.get()) +
-                        y * gdk_pixbuf_get_rowstride(screen.get()) +
-                        x * gdk_pixbuf_get_n_channels(screen.get());
-  return {pixel[0], pixel[1], pixel[2]};
+  const int perPixel = gdk_pixbuf_get_n_channels(screen.get());
+  const guchar* row = gdk_pixbuf_read_pixels(screen.get()) + area.x * perPixel +
+                      area.y * gdk_pixbuf_get_rowstride(screen.get());
+  std::string pixels;
+  for (int y = 0; y < area.height; y++, row += gdk_pixbuf_get_rowstride(screen.get())) {
+    pixels.append(reinterpret_cast<const char*>(row),
+                  static_cast<size_t>(area.width) * static_cast<size_t>(perPixel));
+  }
+  return pixels;
+}
+
+Colour colourAt(const Phone& phone, int x, int y) {
+  const std::string pixel = pixelsOf(phone, {x, y, 1, 1});
+  const auto part = [&pixel](size_t i) {
+    return i < pixel.size() ? static_cast<unsigned char>(pixel[i]) : 0;
+  };
+  return {part(0), part(1), part(2)};
 }
 
 Colour colourOf(const Phone& phone, const std::string& name) {

@@ -13,6 +13,8 @@ struct Colour {
 
   /// Scaling and compression change a colour a little.
   bool isAbout(const Colour& other) const;
+  bool operator==(const Colour& other) const;
+  bool operator!=(const Colour& other) const { return !(*this == other); }
 };
 
 std::ostream& operator<<(std::ostream& out, const Colour& colour);
@@ -29,6 +31,8 @@ std::string pngHeader(unsigned width, unsigned height);
 
 /// The colour of one pixel of the screen.
 Colour colourAt(const Phone& phone, int x, int y);
+/// What the screen shows there, as bytes to compare; empty when that is not on the screen.
+std::string pixelsOf(const Phone& phone, const Area& area);
 /// The colour in the middle of the first widget of that name; black when there is none.
 Colour colourOf(const Phone& phone, const std::string& name);
 

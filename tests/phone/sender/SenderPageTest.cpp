@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <fstream>
 
+#include "Picture.h"
 #include "Screen.h"
 
 using phone::Share;
@@ -25,20 +26,6 @@ class SenderPage : public Sending {
     thePhone()({"contact", "add", "Anna Lindqvist", kFriend, photo});
   }
 
-  /// What ImageMagick says of the screen, or of a part of it.
-  static std::string look(const phone::Words& how) {
-    const std::string file = thePhone().folder() + "/files/screen.png";
-    thePhone()({"screenshot", file});
-    phone::Words words = {"convert", file};
-    words.insert(words.end(), how.begin(), how.end());
-    words.push_back("info:");
-    return phone::run(words).out;
-  }
-
-  static std::string colourAt(int x, int y) {
-    return look({"-format", "%[pixel:p{" + std::to_string(x) + "," + std::to_string(y) + "}]"});
-  }
-
   static const phone::Widget* rowPicture(const Tree& tree) {
     const auto& all = tree.widgets();
     const auto found = std::find_if(all.begin(), all.end(), [](const phone::Widget& widget) {
@@ -53,11 +40,9 @@ class SenderPage : public Sending {
     thePhone()({"painted", "1"});
     const Tree tree = thePhone().tree();
     const phone::Widget* picture = rowPicture(tree);
-    if (!picture) return "none";
-    const phone::Area& area = picture->area;
-    const std::string part = std::to_string(area.width) + "x" + std::to_string(area.height) + "+" +
-                             std::to_string(area.x) + "+" + std::to_string(area.y);
-    return look({"-crop", part, "-format", "%#"});
+    const std::string pixels = picture ? phone::pixelsOf(thePhone(), picture->area) : "";
+    EXPECT_NE(pixels, "") << tree;
+    return std::to_string(std::hash<std::string>()(pixels));
   }
 };
 
@@ -91,9 +76,10 @@ TEST_F(SenderPage, CutsTheRecipientsPhotoToACircle) {
   const phone::Area area = picture->area;
   EXPECT_EQ(area.width, 74) << tree;
   const int row = area.right() + 12;  // between picture and name
-  EXPECT_EQ(colourAt(area.x + 1, area.y + 1), colourAt(row, area.y + 1));
-  const std::string middle = colourAt(area.x + area.width / 2, area.y + area.height / 2);
-  EXPECT_NE(middle, colourAt(row, area.y + area.height / 2));
+  const auto at = [](int x, int y) { return phone::colourAt(thePhone(), x, y); };
+  EXPECT_EQ(at(area.x + 1, area.y + 1), at(row, area.y + 1));
+  const int middle = area.y + area.height / 2;
+  EXPECT_NE(at(area.x + area.width / 2, middle), at(row, middle));
 }
 
 TEST_F(SenderPage, ShowsTheDefaultPictureForAPhotoThatIsNone) {
