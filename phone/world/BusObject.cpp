@@ -1,8 +1,8 @@
 #include "BusObject.h"
 
-using base::Out;
-using base::OwnedError;
-using base::OwnedVariant;
+using common::Out;
+using common::OwnedError;
+using common::OwnedVariant;
 
 BusObject::BusObject(GDBusConnection* bus, std::string path, const char* xml)
     : _bus(bus), _path(std::move(path)), _info(g_dbus_node_info_new_for_xml(xml, nullptr)) {}

@@ -1,7 +1,7 @@
 // One object with one interface on the system bus.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <functional>
 #include <map>
@@ -47,8 +47,8 @@ class BusObject {
 
   GDBusConnection* const _bus;
   const std::string _path;
-  base::Owned<GDBusNodeInfo, g_dbus_node_info_unref> _info;
-  std::map<std::string, base::OwnedVariant> _values;
+  common::Owned<GDBusNodeInfo, g_dbus_node_info_unref> _info;
+  std::map<std::string, common::OwnedVariant> _values;
   std::map<std::string, Method> _methods;
   std::function<void(const std::function<void(const char*)>&)> _listeners;
   guint _registration = 0;

@@ -13,7 +13,7 @@ constexpr const char* kClock = R"(<node><interface name="org.freedesktop.timedat
 <property name="NTPSynchronized" type="b" access="read"/>
 </interface></node>)";
 
-using Zone = base::Owned<GTimeZone, g_time_zone_unref>;
+using Zone = common::Owned<GTimeZone, g_time_zone_unref>;
 
 }  // namespace
 

@@ -14,11 +14,11 @@
 namespace {
 
 bool own(GDBusConnection* bus, const char* name) {
-  base::OwnedError error;
-  const base::OwnedVariant answer(g_dbus_connection_call_sync(
+  common::OwnedError error;
+  const common::OwnedVariant answer(g_dbus_connection_call_sync(
       bus, "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "RequestName",
       g_variant_new("(su)", name, 4u /* do not queue */), G_VARIANT_TYPE("(u)"),
-      G_DBUS_CALL_FLAGS_NONE, -1, nullptr, base::Out(error)));
+      G_DBUS_CALL_FLAGS_NONE, -1, nullptr, common::Out(error)));
   guint32 result = 0;
   if (answer) g_variant_get(answer.get(), "(u)", &result);
   if (result == 1) return true;
@@ -38,7 +38,7 @@ bool ownAll(GDBusConnection* bus) {
 }  // namespace
 
 int main(int argc, char** argv) {
-  const base::OwnedBus bus = base::systemBus();
+  const common::OwnedBus bus = base::systemBus();
   if (!bus) return 1;
   Network network(bus.get());
   OrientationSensor sensor(bus.get());
@@ -51,7 +51,7 @@ int main(int argc, char** argv) {
   }
   puts("ready");
   fflush(stdout);
-  const base::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
+  const common::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
   g_main_loop_run(loop.get());
   return 0;
 }

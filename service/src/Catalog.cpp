@@ -38,7 +38,7 @@ CREATE INDEX IF NOT EXISTS event_by_share ON event(share);
   "id, token, sender, state, single, lenient, lifetime_s, created_ms, expires_ms, file_count"
 #define FILE_COLUMNS "name, size, type, url, thumb, mid, big"
 
-Share readShare(const Query& row) {
+Share readShare(const common::Statement& row) {
   Share share;
   share.id = row.number(0);
   share.token = row.text(1);
@@ -53,18 +53,18 @@ Share readShare(const Query& row) {
   return share;
 }
 
-std::vector<Share> readShares(Query& query) {
+std::vector<Share> readShares(common::Statement& query) {
   std::vector<Share> shares;
   while (query.step()) shares.push_back(readShare(query));
   return shares;
 }
 
-std::optional<Share> readOne(Query& query) {
+std::optional<Share> readOne(common::Statement& query) {
   if (!query.step()) return std::nullopt;
   return readShare(query);
 }
 
-ShareFile readFile(const Query& row) {
+ShareFile readFile(const common::Statement& row) {
   return {row.optionalText(0), row.optionalNumber(1), row.optionalText(2), row.optionalText(3),
           row.optionalText(4), row.optionalText(5),   row.optionalText(6)};
 }
@@ -72,21 +72,22 @@ ShareFile readFile(const Query& row) {
 }  // namespace
 
 bool Catalog::open(const std::string& path) {
-  return _database.open(path, kSchema);
+  _database = common::Database::open(path, kSchema);
+  return _database != nullptr;
 }
 
 std::string Catalog::signUp(const std::string& msisdn, const std::string& imsi) {
   const std::string key = randomHex(kKeyBytes);
   if (key.empty()) return {};
-  Transaction transaction(_database);
+  common::Transaction transaction(*_database);
   const bool done = _database
-                        .query(
+                        ->prepare(
                             "INSERT INTO subscriber(msisdn, imsi, sharing) VALUES(?, ?, 1) "
                             "ON CONFLICT(msisdn) DO UPDATE SET imsi = excluded.imsi")
                         .bind(msisdn)
                         .bind(imsi)
                         .run() &&
-                    _database.query("INSERT INTO access(fingerprint, msisdn) VALUES(?, ?)")
+                    _database->prepare("INSERT INTO access(fingerprint, msisdn) VALUES(?, ?)")
                         .bind(fingerprint(key))
                         .bind(msisdn)
                         .run();
@@ -94,19 +95,19 @@ std::string Catalog::signUp(const std::string& msisdn, const std::string& imsi) 
 }
 
 std::optional<std::string> Catalog::ownerOf(const std::string& key) {
-  Query query = _database.query("SELECT msisdn FROM access WHERE fingerprint = ?");
+  common::Statement query = _database->prepare("SELECT msisdn FROM access WHERE fingerprint = ?");
   if (!query.bind(fingerprint(key)).step()) return std::nullopt;
   return query.text(0);
 }
 
 std::optional<bool> Catalog::sharingOn(const std::string& msisdn) {
-  Query query = _database.query("SELECT sharing FROM subscriber WHERE msisdn = ?");
+  common::Statement query = _database->prepare("SELECT sharing FROM subscriber WHERE msisdn = ?");
   if (!query.bind(msisdn).step()) return std::nullopt;
   return query.number(0) != 0;
 }
 
 bool Catalog::setSharing(const std::string& msisdn, bool on) {
-  return _database.query("UPDATE subscriber SET sharing = ? WHERE msisdn = ?")
+  return _database->prepare("UPDATE subscriber SET sharing = ? WHERE msisdn = ?")
       .bind(std::int64_t{on})
       .bind(msisdn)
       .run();
@@ -115,10 +116,10 @@ bool Catalog::setSharing(const std::string& msisdn, bool on) {
 std::optional<Share> Catalog::create(const ShareDraft& draft, std::int64_t nowMs) {
   const std::string token = randomHex(kTokenBytes);
   if (token.empty()) return std::nullopt;
-  Transaction transaction(_database);
+  common::Transaction transaction(*_database);
   if (!_database
-           .query("INSERT INTO share(token, sender, state, single, lenient, lifetime_s, "
-                  "created_ms, expires_ms, file_count) VALUES(?, ?, 0, ?, ?, ?, ?, 0, ?)")
+           ->prepare("INSERT INTO share(token, sender, state, single, lenient, lifetime_s, "
+                     "created_ms, expires_ms, file_count) VALUES(?, ?, 0, ?, ?, ?, ?, 0, ?)")
            .bind(token)
            .bind(draft.sender)
            .bind(std::int64_t{draft.single})
@@ -129,7 +130,7 @@ std::optional<Share> Catalog::create(const ShareDraft& draft, std::int64_t nowMs
            .run()) {
     return std::nullopt;
   }
-  const std::int64_t id = _database.lastRowId();
+  const std::int64_t id = _database->lastRowId();
   if (!insertDetails(id, draft) || !transaction.commit()) return std::nullopt;
   return share(id);
 }
@@ -137,7 +138,7 @@ std::optional<Share> Catalog::create(const ShareDraft& draft, std::int64_t nowMs
 bool Catalog::insertDetails(std::int64_t id, const ShareDraft& draft) {
   std::int64_t position = 0;
   for (const std::string& msisdn : draft.recipients) {
-    if (!_database.query("INSERT INTO recipient(share, position, msisdn) VALUES(?, ?, ?)")
+    if (!_database->prepare("INSERT INTO recipient(share, position, msisdn) VALUES(?, ?, ?)")
              .bind(id)
              .bind(position++)
              .bind(msisdn)
@@ -148,8 +149,8 @@ bool Catalog::insertDetails(std::int64_t id, const ShareDraft& draft) {
   position = 0;
   for (const ShareFile& file : draft.files) {
     if (!_database
-             .query("INSERT INTO file(share, position, " FILE_COLUMNS
-                    ") VALUES(?, ?, ?, ?, ?, ?, ?, ?, ?)")
+             ->prepare("INSERT INTO file(share, position, " FILE_COLUMNS
+                       ") VALUES(?, ?, ?, ?, ?, ?, ?, ?, ?)")
              .bind(id)
              .bind(position++)
              .bind(file.name)
@@ -167,43 +168,45 @@ bool Catalog::insertDetails(std::int64_t id, const ShareDraft& draft) {
 }
 
 std::optional<Share> Catalog::share(std::int64_t id) {
-  Query query = _database.query("SELECT " SHARE_COLUMNS " FROM share WHERE id = ?");
+  common::Statement query = _database->prepare("SELECT " SHARE_COLUMNS " FROM share WHERE id = ?");
   return readOne(query.bind(id));
 }
 
 std::optional<Share> Catalog::shareByToken(const std::string& token) {
-  Query query = _database.query("SELECT " SHARE_COLUMNS " FROM share WHERE token = ?");
+  common::Statement query =
+      _database->prepare("SELECT " SHARE_COLUMNS " FROM share WHERE token = ?");
   return readOne(query.bind(token));
 }
 
 std::vector<Share> Catalog::sharesIn(ShareState state) {
-  Query query = _database.query("SELECT " SHARE_COLUMNS " FROM share WHERE state = ? ORDER BY id");
+  common::Statement query =
+      _database->prepare("SELECT " SHARE_COLUMNS " FROM share WHERE state = ? ORDER BY id");
   return readShares(query.bind(static_cast<std::int64_t>(state)));
 }
 
 std::vector<Share> Catalog::overdue(std::int64_t nowMs) {
-  Query query = _database.query("SELECT " SHARE_COLUMNS
-                                " FROM share WHERE state = 2 AND expires_ms <= ? ORDER BY id");
+  common::Statement query = _database->prepare(
+      "SELECT " SHARE_COLUMNS " FROM share WHERE state = 2 AND expires_ms <= ? ORDER BY id");
   return readShares(query.bind(nowMs));
 }
 
 std::optional<std::int64_t> Catalog::nextExpiryMs() {
-  Query query = _database.query("SELECT MIN(expires_ms) FROM share WHERE state = 2");
+  common::Statement query = _database->prepare("SELECT MIN(expires_ms) FROM share WHERE state = 2");
   if (!query.step()) return std::nullopt;
   return query.optionalNumber(0);
 }
 
 std::optional<ShareFile> Catalog::file(std::int64_t id, std::int64_t index) {
-  Query query =
-      _database.query("SELECT " FILE_COLUMNS " FROM file WHERE share = ? AND position = ?");
+  common::Statement query =
+      _database->prepare("SELECT " FILE_COLUMNS " FROM file WHERE share = ? AND position = ?");
   if (!query.bind(id).bind(index).step()) return std::nullopt;
   return readFile(query);
 }
 
 std::vector<ShareFile> Catalog::files(std::int64_t id) {
   std::vector<ShareFile> files;
-  Query query =
-      _database.query("SELECT " FILE_COLUMNS " FROM file WHERE share = ? ORDER BY position");
+  common::Statement query =
+      _database->prepare("SELECT " FILE_COLUMNS " FROM file WHERE share = ? ORDER BY position");
   query.bind(id);
   while (query.step()) files.push_back(readFile(query));
   return files;
@@ -211,29 +214,30 @@ std::vector<ShareFile> Catalog::files(std::int64_t id) {
 
 std::vector<std::string> Catalog::recipients(std::int64_t id) {
   std::vector<std::string> msisdns;
-  Query query = _database.query("SELECT msisdn FROM recipient WHERE share = ? ORDER BY position");
+  common::Statement query =
+      _database->prepare("SELECT msisdn FROM recipient WHERE share = ? ORDER BY position");
   query.bind(id);
   while (query.step()) msisdns.push_back(query.text(0));
   return msisdns;
 }
 
 bool Catalog::setState(std::int64_t id, ShareState state) {
-  return _database.query("UPDATE share SET state = ? WHERE id = ?")
+  return _database->prepare("UPDATE share SET state = ? WHERE id = ?")
       .bind(static_cast<std::int64_t>(state))
       .bind(id)
       .run();
 }
 
 bool Catalog::prepare(std::int64_t id, std::int64_t expiresMs) {
-  return _database.query("UPDATE share SET state = 1, expires_ms = ? WHERE id = ?")
+  return _database->prepare("UPDATE share SET state = 1, expires_ms = ? WHERE id = ?")
       .bind(expiresMs)
       .bind(id)
       .run();
 }
 
 bool Catalog::publish(std::int64_t id, const std::string& manifest) {
-  Transaction transaction(_database);
-  return _database.query("UPDATE share SET manifest = ? WHERE id = ?")
+  common::Transaction transaction(*_database);
+  return _database->prepare("UPDATE share SET manifest = ? WHERE id = ?")
              .bind(manifest)
              .bind(id)
              .run() &&
@@ -250,7 +254,7 @@ bool Catalog::recall(std::int64_t id) {
   if (!recalled) return false;
   std::vector<std::string> told = recipients(id);
   told.push_back(recalled->sender);
-  Transaction transaction(_database);
+  common::Transaction transaction(*_database);
   return setState(id, ShareState::Recalled) && addEvents(id, "recalled", told) &&
          transaction.commit();
 }
@@ -258,7 +262,7 @@ bool Catalog::recall(std::int64_t id) {
 bool Catalog::addEvents(std::int64_t id, const char* kind,
                         const std::vector<std::string>& msisdns) {
   for (const std::string& msisdn : msisdns) {
-    if (!_database.query("INSERT INTO event(msisdn, kind, share) VALUES(?, ?, ?)")
+    if (!_database->prepare("INSERT INTO event(msisdn, kind, share) VALUES(?, ?, ?)")
              .bind(msisdn)
              .bind(std::string(kind))
              .bind(id)
@@ -271,7 +275,7 @@ bool Catalog::addEvents(std::int64_t id, const char* kind,
 
 std::vector<Event> Catalog::events(const std::string& msisdn, std::int64_t after, int limit) {
   std::vector<Event> events;
-  Query query = _database.query(
+  common::Statement query = _database->prepare(
       "SELECT event.id, kind, share.id, token, iif(kind = 'received', manifest, '') "
       "FROM event JOIN share ON share.id = event.share "
       "WHERE msisdn = ? AND event.id > ? ORDER BY event.id LIMIT ?");
@@ -284,7 +288,7 @@ std::vector<Event> Catalog::events(const std::string& msisdn, std::int64_t after
 }
 
 std::vector<Share> Catalog::purge(std::int64_t createdBeforeMs) {
-  Query query = _database.query(
+  common::Statement query = _database->prepare(
       "DELETE FROM share WHERE created_ms < ? AND state IN (0, 3, 4) "
       "RETURNING " SHARE_COLUMNS);
   return readShares(query.bind(createdBeforeMs));

@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
+#include <common/Database.h>
 #include "Share.h"
-#include "Sqlite.h"
 
 namespace service {
 
@@ -51,7 +51,7 @@ class Catalog {
   bool setState(std::int64_t id, ShareState state);
   bool addEvents(std::int64_t id, const char* kind, const std::vector<std::string>& msisdns);
 
-  Sqlite _database;
+  std::unique_ptr<common::Database> _database;
 };
 
 }  // namespace service

@@ -2,8 +2,8 @@
 
 #include <algorithm>
 
+#include <common/Json.h>
 #include "Address.h"
-#include "Json.h"
 
 namespace service {
 namespace {
@@ -33,14 +33,14 @@ bool isWithinLimits(const ShareFile& file) {
 
 ShareFile readFile(JsonObject* json, bool lenient) {
   ShareFile file;
-  file.name = textMember(json, "name");
-  file.size = numberMember(json, "size");
-  file.type = textMember(json, "type");
+  file.name = common::textMember(json, "name");
+  file.size = common::numberMember(json, "size");
+  file.type = common::textMember(json, "type");
   if (lenient) {
-    file.url = textMember(json, "url");
-    file.thumb = textMember(json, "thumb");
-    file.mid = textMember(json, "mid");
-    file.big = textMember(json, "big");
+    file.url = common::textMember(json, "url");
+    file.thumb = common::textMember(json, "thumb");
+    file.mid = common::textMember(json, "mid");
+    file.big = common::textMember(json, "big");
   }
   return file;
 }
@@ -77,12 +77,12 @@ const char* readFiles(JsonArray* array, ShareDraft& draft) {
 }  // namespace
 
 const char* readDraft(JsonObject* json, ShareDraft& draft) {
-  draft.single = flagMember(json, "single");
-  draft.lenient = flagMember(json, "lenient");
-  draft.lifetimeS = numberMember(json, "expires_in_s").value_or(kDefaultLifetimeS);
+  draft.single = common::flagMember(json, "single");
+  draft.lenient = common::flagMember(json, "lenient");
+  draft.lifetimeS = common::numberMember(json, "expires_in_s").value_or(kDefaultLifetimeS);
   if (draft.lifetimeS < 1 || draft.lifetimeS > kMaxLifetimeS) return "expires_in_s: up to 90 days";
-  if (const char* reason = readRecipients(arrayMember(json, "to"), draft)) return reason;
-  return readFiles(arrayMember(json, "files"), draft);
+  if (const char* reason = readRecipients(common::arrayMember(json, "to"), draft)) return reason;
+  return readFiles(common::arrayMember(json, "files"), draft);
 }
 
 }  // namespace service

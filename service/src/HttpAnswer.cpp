@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "Json.h"
+#include <common/Json.h>
 
 namespace service {
 
@@ -15,7 +15,7 @@ void answerJson(SoupServerMessage* message, guint status, const std::string& jso
 }
 
 void answerError(SoupServerMessage* message, guint status, const char* reason) {
-  answerJson(message, status, JsonWriter().open().text("error", reason).close().str());
+  answerJson(message, status, common::JsonWriter().open().text("error", reason).close().str());
 }
 
 HeldRequest::HeldRequest(SoupServerMessage* message) : _message(refer(message)) {

@@ -1,12 +1,13 @@
 #include "ManifestWriter.h"
 
-#include "Json.h"
+#include <common/Json.h>
 
 namespace service {
 namespace {
 
-void writeAddress(JsonWriter& json, const char* member, const std::optional<std::string>& own,
-                  BlobKind kind, std::int64_t index, bool there) {
+void writeAddress(common::JsonWriter& json, const char* member,
+                  const std::optional<std::string>& own, BlobKind kind, std::int64_t index,
+                  bool there) {
   if (own) {
     json.text(member, *own);
   } else if (there) {
@@ -14,7 +15,7 @@ void writeAddress(JsonWriter& json, const char* member, const std::optional<std:
   }
 }
 
-void writeFile(JsonWriter& json, const ShareFile& file, std::int64_t id, std::int64_t index,
+void writeFile(common::JsonWriter& json, const ShareFile& file, std::int64_t id, std::int64_t index,
                const BlobStore& blobs) {
   const auto there = [&](BlobKind kind) { return blobs.stagedSize(id, kind, index).has_value(); };
   json.open();
@@ -32,7 +33,7 @@ void writeFile(JsonWriter& json, const ShareFile& file, std::int64_t id, std::in
 
 std::string writeManifest(const Share& share, const std::vector<ShareFile>& files,
                           const BlobStore& blobs) {
-  JsonWriter json;
+  common::JsonWriter json;
   json.open()
       .text("token", share.token)
       .text("from", share.sender)

@@ -1,38 +1,20 @@
 /// Owners of the C handles that the service uses.
 #pragma once
 
-#include <gio/gio.h>
+#include <common/Owned.h>
 
-#include <memory>
 #include <utility>
 
 namespace service {
 
-template <auto Release>
-struct Releaser {
-  template <typename T>
-  void operator()(T* handle) const {
-    Release(handle);
-  }
-};
-
-template <typename T, auto Release>
-using Owned = std::unique_ptr<T, Releaser<Release>>;
-
-using Text = Owned<char, g_free>;
-using Error = Owned<GError, g_error_free>;
-using Bytes = Owned<GBytes, g_bytes_unref>;
+using common::Owned;
+using common::refer;
+using Text = common::OwnedText;
+using Bytes = common::OwnedBytes;
 using MappedFile = Owned<GMappedFile, g_mapped_file_unref>;
 using Checksum = Owned<GChecksum, g_checksum_free>;
-
-/// One reference to a GObject.
 template <typename T>
-using Ref = Owned<T, g_object_unref>;
-
-template <typename T>
-Ref<T> refer(T* object) {
-  return Ref<T>(static_cast<T*>(g_object_ref(object)));
-}
+using Ref = common::OwnedObject<T>;
 
 /// Passed to a C function that answers with a new GError.
 class ErrorOut {

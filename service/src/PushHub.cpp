@@ -2,7 +2,7 @@
 
 #include <vector>
 
-#include "Json.h"
+#include <common/Json.h>
 
 namespace service {
 namespace {
@@ -11,14 +11,14 @@ constexpr int kMaxEvents = 64;
 // An answer ends after the event that passes this size.
 constexpr std::size_t kAnswerSize = 1 << 20;
 
-void writeEvent(JsonWriter& json, const Event& event, const std::string& publicUrl) {
+void writeEvent(common::JsonWriter& json, const Event& event, const std::string& publicUrl) {
   json.open()
       .number("id", event.id)
       .text("kind", event.kind)
       .text("token", event.token)
       .number("request_id", event.shareId);
   if (!publicUrl.empty()) json.text("base", publicUrl + "/share/" + event.token);
-  if (const JsonTree manifest = parseJsonObject(event.manifest)) {
+  if (const common::JsonTree manifest = common::parseJsonObject(event.manifest)) {
     json.tree("share", manifest.get());
   }
   json.close();
@@ -26,7 +26,7 @@ void writeEvent(JsonWriter& json, const Event& event, const std::string& publicU
 
 void answer(SoupServerMessage* message, const std::vector<Event>& events, std::int64_t after,
             const std::string& publicUrl) {
-  JsonWriter json;
+  common::JsonWriter json;
   json.open().openArray("events");
   std::int64_t cursor = after;
   std::size_t size = 0;

@@ -3,8 +3,8 @@
 #include <memory>
 #include <utility>
 
+#include <common/Json.h>
 #include "Address.h"
-#include "Json.h"
 
 namespace service {
 namespace {
@@ -123,7 +123,7 @@ void Server::answerLater(SoupServerMessage* message, std::vector<std::string> pa
 }
 
 void Server::answerStats(SoupServerMessage* message) const {
-  JsonWriter json;
+  common::JsonWriter json;
   json.open().number("manifest", _stats.manifests);
   for (const BlobKind kind : {BlobKind::File, BlobKind::Thumb, BlobKind::Mid, BlobKind::Big}) {
     json.number(blobWord(kind), _stats.blobs.at(static_cast<std::size_t>(kind)));

@@ -2,9 +2,9 @@
 
 #include <algorithm>
 
+#include <common/Json.h>
 #include "Address.h"
 #include "DraftReader.h"
-#include "Json.h"
 #include "Session.h"
 #include "Upload.h"
 
@@ -16,15 +16,15 @@ constexpr guint kLongestPollS = 25;
 constexpr guint kLongestHoldMs = 25000;
 constexpr char kSharingService[] = "2";
 
-JsonTree readBody(SoupServerMessage* message) {
+common::JsonTree readBody(SoupServerMessage* message) {
   const Bytes body(soup_message_body_flatten(soup_server_message_get_request_body(message)));
   gsize size = 0;
   const auto* data = static_cast<const char*>(g_bytes_get_data(body.get(), &size));
-  return parseJsonObject({data ? data : "", size});
+  return common::parseJsonObject({data ? data : "", size});
 }
 
 std::string shareJson(const Share& share) {
-  JsonWriter json;
+  common::JsonWriter json;
   json.open()
       .text("token", share.token)
       .number("request_id", share.id)
@@ -151,7 +151,7 @@ void WriteSide::create(SoupServerMessage* message) {
     answerError(message, SOUP_STATUS_FORBIDDEN, "sharing is switched off");
     return;
   }
-  const JsonTree body = readBody(message);
+  const common::JsonTree body = readBody(message);
   ShareDraft draft;
   draft.sender = *sender;
   const char* reason =
@@ -165,7 +165,7 @@ void WriteSide::create(SoupServerMessage* message) {
     answerError(message, SOUP_STATUS_INSUFFICIENT_STORAGE, "cannot be stored");
     return;
   }
-  JsonWriter json;
+  common::JsonWriter json;
   json.open()
       .text("token", share->token)
       .number("request_id", share->id)
@@ -261,10 +261,10 @@ bool WriteSide::push(SoupServerMessage* message, GHashTable* query) {
 }
 
 void WriteSide::signUp(SoupServerMessage* message) {
-  const JsonTree body = readBody(message);
+  const common::JsonTree body = readBody(message);
   JsonObject* json = body ? json_node_get_object(body.get()) : nullptr;
-  const auto msisdn = json ? textMember(json, "msisdn") : std::nullopt;
-  const auto imsi = json ? textMember(json, "imsi") : std::nullopt;
+  const auto msisdn = json ? common::textMember(json, "msisdn") : std::nullopt;
+  const auto imsi = json ? common::textMember(json, "imsi") : std::nullopt;
   if (!msisdn || !isMsisdn(*msisdn)) {
     answerError(message, SOUP_STATUS_BAD_REQUEST, "msisdn: a number in international form");
     return;
@@ -279,7 +279,7 @@ void WriteSide::signUp(SoupServerMessage* message) {
     return;
   }
   answerJson(message, SOUP_STATUS_CREATED,
-             JsonWriter().open().text("msisdn", *msisdn).text("key", key).close().str());
+             common::JsonWriter().open().text("msisdn", *msisdn).text("key", key).close().str());
 }
 
 void WriteSide::sharingStatus(SoupServerMessage* message, const std::string& msisdn) {
@@ -290,9 +290,9 @@ void WriteSide::sharingStatus(SoupServerMessage* message, const std::string& msi
     return;
   }
   if (g_str_equal(soup_server_message_get_method(message), "PUT")) {
-    const JsonTree body = readBody(message);
+    const common::JsonTree body = readBody(message);
     const auto status =
-        body ? textMember(json_node_get_object(body.get()), "status") : std::nullopt;
+        body ? common::textMember(json_node_get_object(body.get()), "status") : std::nullopt;
     if (!status || (*status != "on" && *status != "off")) {
       answerError(message, SOUP_STATUS_BAD_REQUEST, "status: on or off");
       return;
@@ -304,7 +304,7 @@ void WriteSide::sharingStatus(SoupServerMessage* message, const std::string& msi
   }
   const bool on = _catalog.sharingOn(msisdn).value_or(false);
   answerJson(message, SOUP_STATUS_OK,
-             JsonWriter().open().text("status", on ? "on" : "off").close().str());
+             common::JsonWriter().open().text("status", on ? "on" : "off").close().str());
 }
 
 }  // namespace service

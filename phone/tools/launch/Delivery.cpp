@@ -38,8 +38,8 @@ void Delivery::_see(GDBusMessage* message, bool incoming) {
     return;
   }
   if (!_serial || g_dbus_message_get_reply_serial(message) != _serial) return;
-  base::OwnedError error;
-  if (g_dbus_message_to_gerror(message, base::Out(error))) {
+  common::OwnedError error;
+  if (g_dbus_message_to_gerror(message, common::Out(error))) {
     g_dbus_error_strip_remote_error(error.get());
     _reason = error->message;
   }

@@ -1,7 +1,7 @@
 // Watches one launch request on its way: the caller of a launch is not told whether it arrived.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <condition_variable>
 #include <mutex>

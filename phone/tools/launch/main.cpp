@@ -22,7 +22,7 @@ constexpr const char* kViewer = "com.orlant.zelqo";
 constexpr const char* kOperations = "http://tizen.org/appcontrol/operation/";
 constexpr int kWrongCall = 2;
 
-using Request = base::Owned<app_control_s, app_control_destroy>;
+using Request = common::Owned<app_control_s, app_control_destroy>;
 
 struct Extra {
   std::string key;
@@ -109,7 +109,7 @@ int fill(app_control_h request, const Call& call) {
 }
 
 int launch(const Call& call) {
-  const base::OwnedBus bus = base::sessionBus();
+  const common::OwnedBus bus = base::sessionBus();
   if (!bus) return fail("there is no session bus");
   std::unique_ptr<appfw::CallerName> name;
   if (!call.caller.empty()) {
@@ -117,7 +117,7 @@ int launch(const Call& call) {
     if (!name->isValid()) return fail("cannot act as " + call.caller);
   }
   Request request;
-  app_control_create(base::Out(request));
+  app_control_create(common::Out(request));
   if (const int error = fill(request.get(), call)) {
     return fail("the request is refused, error " + std::to_string(error));
   }

@@ -4,9 +4,9 @@
 
 #include <cstring>
 
-using base::Owned;
-using base::OwnedText;
-using base::OwnedVariant;
+using common::Owned;
+using common::OwnedText;
+using common::OwnedVariant;
 
 namespace {
 
@@ -33,7 +33,7 @@ void addArguments(JsonBuilder* builder, GVariant* body) {
 
 }  // namespace
 
-Recorder::Recorder(base::OwnedBus bus, const char* file)
+Recorder::Recorder(common::OwnedBus bus, const char* file)
     : _file(fopen(file, "ae")),
       _signals(std::move(bus), {nullptr, nullptr, nullptr, nullptr}, _signalCb, this) {}
 

@@ -9,7 +9,7 @@
 class Recorder {
  public:
   /// Appends to the file; check isOpen().
-  Recorder(base::OwnedBus bus, const char* file);
+  Recorder(common::OwnedBus bus, const char* file);
 
   bool isOpen() const { return _file != nullptr; }
 
@@ -17,6 +17,6 @@ class Recorder {
   static void _signalCb(GDBusConnection*, const char* sender, const char* path,
                         const char* interface, const char* member, GVariant* body, gpointer self);
 
-  base::Owned<FILE, fclose> _file;
+  common::Owned<FILE, fclose> _file;
   base::SignalSubscription _signals;
 };

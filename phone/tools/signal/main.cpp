@@ -22,23 +22,23 @@ int fail(const char* why) {
 int send(const char* member, const char* text) {
   if (!g_dbus_is_member_name(member)) return fail("that is not the name of a signal");
   if (!g_utf8_validate(text, -1, nullptr)) return fail("the text is not valid UTF-8");
-  const base::OwnedBus bus = base::systemBus();
+  const common::OwnedBus bus = base::systemBus();
   if (!bus) return 1;
-  base::OwnedError error;
+  common::OwnedError error;
   g_dbus_connection_emit_signal(bus.get(), nullptr, kPath, kInterface, member,
-                                g_variant_new("(s)", text), base::Out(error));
-  if (!error) g_dbus_connection_flush_sync(bus.get(), nullptr, base::Out(error));
+                                g_variant_new("(s)", text), common::Out(error));
+  if (!error) g_dbus_connection_flush_sync(bus.get(), nullptr, common::Out(error));
   return error ? fail(error->message) : 0;
 }
 
 int record(const char* file) {
-  base::OwnedBus bus = base::systemBus();
+  common::OwnedBus bus = base::systemBus();
   if (!bus) return 1;
   const Recorder recorder(std::move(bus), file);
   if (!recorder.isOpen()) return fail("the record cannot be written");
   puts("ready");
   fflush(stdout);
-  const base::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
+  const common::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
   g_main_loop_run(loop.get());
   return 0;
 }

@@ -1,9 +1,9 @@
 #include "AccessibleTree.h"
 
-using base::Out;
-using base::OwnedError;
-using base::OwnedText;
-using base::OwnedVariant;
+using common::Out;
+using common::OwnedError;
+using common::OwnedText;
+using common::OwnedVariant;
 
 namespace {
 

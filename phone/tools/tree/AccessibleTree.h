@@ -4,7 +4,7 @@
 // cannot send a longer answer.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <deque>
 #include <functional>
@@ -46,7 +46,7 @@ class AccessibleTree {
   static void _answeredCb(GObject* bus, GAsyncResult* result, gpointer question);
 
   GDBusConnection* const _bus;
-  const base::Owned<GCancellable, g_object_unref> _cancellable;
+  const common::Owned<GCancellable, g_object_unref> _cancellable;
   std::string _name, _path;
   std::deque<std::unique_ptr<Question>> _waiting;
   int _open = 0;

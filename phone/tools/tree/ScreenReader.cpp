@@ -7,11 +7,11 @@
 #include <cstdio>
 #include <string>
 
-using base::Out;
-using base::OwnedBus;
-using base::OwnedError;
-using base::OwnedText;
-using base::OwnedVariant;
+using common::Out;
+using common::OwnedBus;
+using common::OwnedError;
+using common::OwnedText;
+using common::OwnedVariant;
 
 namespace {
 

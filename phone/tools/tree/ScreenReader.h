@@ -3,7 +3,7 @@
 // all keys.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 class ScreenReader {
  public:
@@ -13,7 +13,7 @@ class ScreenReader {
   ScreenReader& operator=(const ScreenReader&) = delete;
 
   /// The accessibility bus; null when there is none.
-  base::OwnedBus connect() const;
+  common::OwnedBus connect() const;
 
  private:
   bool _isOn() const;

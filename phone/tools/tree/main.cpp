@@ -52,10 +52,10 @@ std::string lookUntilStable(AccessibleTree& tree) {
 }  // namespace
 
 int main() {
-  const base::OwnedBus session = base::sessionBus();
+  const common::OwnedBus session = base::sessionBus();
   if (!session) return 1;
   const ScreenReader reader(session.get());
-  const base::OwnedBus bus = reader.connect();
+  const common::OwnedBus bus = reader.connect();
   if (!bus) return 1;
   AccessibleTree tree(bus.get());
   fputs(lookUntilStable(tree).c_str(), stdout);

@@ -1,5 +1,5 @@
 // Shares files as any subscriber, and returns when they have arrived.
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <zelqo/PhoneSettings.h>
 #include <zelqo/Uploader.h>
 
@@ -20,13 +20,13 @@ struct Arguments {
 };
 
 std::string takeText(char* text) {
-  const base::OwnedText owner(text);
+  const common::OwnedText owner(text);
   return text ? text : "";
 }
 
 std::vector<std::string> splitNumbers(const std::string& text) {
   std::vector<std::string> numbers;
-  const base::OwnedTexts parts(g_strsplit(text.c_str(), ",", -1));
+  const common::OwnedTexts parts(g_strsplit(text.c_str(), ",", -1));
   for (char** part = parts.get(); *part; part++) {
     if (**part) numbers.emplace_back(*part);
   }
@@ -35,12 +35,12 @@ std::vector<std::string> splitNumbers(const std::string& text) {
 
 // The service takes whole paths; the phone's programs run elsewhere.
 std::string absolute(const char* path) {
-  const base::OwnedText text(g_canonicalize_filename(path, nullptr));
+  const common::OwnedText text(g_canonicalize_filename(path, nullptr));
   return text.get();
 }
 
 const char* readRawManifest(const std::string& path, std::string& json) {
-  base::OwnedText text;
+  common::OwnedText text;
   gsize size = 0;
   char* contents = nullptr;
   if (!g_file_get_contents(path.c_str(), &contents, &size, nullptr)) {
@@ -78,11 +78,11 @@ bool readArguments(int argc, char** argv, Arguments& arguments) {
        "JSON array to announce instead of the files", "FILE"},
       {G_OPTION_REMAINING, 0, 0, G_OPTION_ARG_FILENAME_ARRAY, &files, nullptr, "FILE..."},
       {nullptr, 0, 0, G_OPTION_ARG_NONE, nullptr, nullptr, nullptr}};
-  const base::Owned<GOptionContext, g_option_context_free> context(g_option_context_new(nullptr));
+  const common::Owned<GOptionContext, g_option_context_free> context(g_option_context_new(nullptr));
   g_option_context_add_main_entries(context.get(), entries, nullptr);
-  base::OwnedError error;
-  const bool parsed = g_option_context_parse(context.get(), &argc, &argv, base::Out(error));
-  const base::OwnedTexts filesOwner(files);
+  common::OwnedError error;
+  const bool parsed = g_option_context_parse(context.get(), &argc, &argv, common::Out(error));
+  const common::OwnedTexts filesOwner(files);
   arguments.service = takeText(service);
   request.from = takeText(from);
   request.to = splitNumbers(takeText(to));
@@ -158,7 +158,7 @@ class Sharing {
 int main(int argc, char** argv) {
   Arguments arguments;
   if (!readArguments(argc, argv, arguments)) return 2;
-  const base::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
+  const common::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
   const Sharing sharing(loop.get(), arguments);
   g_main_loop_run(loop.get());
   return sharing.exitCode();

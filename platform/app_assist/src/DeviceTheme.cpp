@@ -5,8 +5,8 @@
 #include <dlog.h>
 #include <vconf.h>
 
-#include <base/Owned.h>
 #include <base/PhonePaths.h>
+#include <common/Owned.h>
 
 #include <algorithm>
 #include <cstdio>
@@ -23,7 +23,7 @@ constexpr double kDesignWidth = 720;
 /// Titles keep their size, or they would not fit.
 constexpr const char* kScaledTexts[] = {"caption", "body", "label"};
 
-using OwnedData = base::Owned<char, free>;
+using OwnedData = common::Owned<char, free>;
 
 std::string themeData(const std::string& key) {
   const OwnedData value(edje_file_data_get(DeviceTheme::path().c_str(), key.c_str()));
@@ -78,10 +78,10 @@ bool DeviceTheme::install() {
 }
 
 void DeviceTheme::applyPalette() {
-  const base::Owned<char, free> wanted(vconf_get_str(kThemeKey));
+  const common::Owned<char, free> wanted(vconf_get_str(kThemeKey));
   const char* palette = wanted && strcmp(wanted.get(), "dark") == 0 ? "dark" : "light";
   const std::string names = themeData("colours");
-  const base::OwnedTexts list(g_strsplit(names.c_str(), " ", -1));
+  const common::OwnedTexts list(g_strsplit(names.c_str(), " ", -1));
   for (char** name = list.get(); *name; name++) {
     if (**name) setColour(*name, palette);
   }
@@ -96,7 +96,7 @@ void DeviceTheme::applyTextSize() {
 
 void DeviceTheme::applyScale() {
   int count = 0;
-  const base::Owned<Ecore_X_Window, free> roots(ecore_x_window_root_list(&count));
+  const common::Owned<Ecore_X_Window, free> roots(ecore_x_window_root_list(&count));
   int width = 0, height = 0;
   if (count > 0) ecore_x_window_size_get(roots.get()[0], &width, &height);
   elm_config_scale_set(width > 0 ? kDesignScale * width / kDesignWidth : kDesignScale);

@@ -6,8 +6,8 @@
 #include <unicode/uloc.h>
 #include <vconf.h>
 
-#include <base/Owned.h>
 #include <base/PhonePaths.h>
+#include <common/Owned.h>
 
 #include <clocale>
 #include <cstdlib>
@@ -20,7 +20,7 @@ extern int _nl_msg_cat_cntr;
 namespace app_assist {
 namespace {
 
-using OwnedPlainText = base::Owned<char, free>;
+using OwnedPlainText = common::Owned<char, free>;
 
 void bind(const char* domain, const std::string& folder) {
   bindtextdomain(domain, folder.c_str());
@@ -29,10 +29,10 @@ void bind(const char* domain, const std::string& folder) {
 
 /// Domains are the names of the catalogues of any language.
 void bindFolder(const std::string& folder) {
-  const base::Owned<GDir, g_dir_close> languages(g_dir_open(folder.c_str(), 0, nullptr));
+  const common::Owned<GDir, g_dir_close> languages(g_dir_open(folder.c_str(), 0, nullptr));
   while (const char* language = languages ? g_dir_read_name(languages.get()) : nullptr) {
     const std::string messages = folder + "/" + language + "/LC_MESSAGES";
-    const base::Owned<GDir, g_dir_close> files(g_dir_open(messages.c_str(), 0, nullptr));
+    const common::Owned<GDir, g_dir_close> files(g_dir_open(messages.c_str(), 0, nullptr));
     while (const char* file = files ? g_dir_read_name(files.get()) : nullptr) {
       if (!g_str_has_suffix(file, ".mo")) continue;
       const std::string name(file);

@@ -2,7 +2,7 @@
 
 #include <dlog.h>
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <cstring>
 
@@ -45,7 +45,7 @@ Orientation::~Orientation() {
 void Orientation::proxyReadyCb(GObject*, GAsyncResult* result, void* data) {
   GError* error = nullptr;
   GDBusProxy* proxy = g_dbus_proxy_new_for_bus_finish(result, &error);
-  const base::OwnedError owned(error);
+  const common::OwnedError owned(error);
   if (proxy) {
     static_cast<Orientation*>(data)->setProxy(proxy);
   } else if (!g_error_matches(error, G_IO_ERROR, G_IO_ERROR_CANCELLED)) {
@@ -62,7 +62,7 @@ void Orientation::setProxy(GDBusProxy* proxy) {
 
 /// The sensor reports only to those who claimed it, and a new one knows of no claims.
 void Orientation::claim() {
-  const base::OwnedText owner(g_dbus_proxy_get_name_owner(_proxy));
+  const common::OwnedText owner(g_dbus_proxy_get_name_owner(_proxy));
   if (!owner) return;
   g_dbus_proxy_call(_proxy, "ClaimAccelerometer", nullptr, G_DBUS_CALL_FLAGS_NO_AUTO_START, -1,
                     _cancellable, claimedCb, this);
@@ -70,9 +70,9 @@ void Orientation::claim() {
 
 void Orientation::claimedCb(GObject* proxy, GAsyncResult* result, void* data) {
   GError* error = nullptr;
-  const base::OwnedVariant answer(
+  const common::OwnedVariant answer(
       g_dbus_proxy_call_finish(reinterpret_cast<GDBusProxy*>(proxy), result, &error));
-  const base::OwnedError owned(error);
+  const common::OwnedError owned(error);
   if (answer) {
     static_cast<Orientation*>(data)->report();
   } else if (!g_error_matches(error, G_IO_ERROR, G_IO_ERROR_CANCELLED)) {
@@ -81,7 +81,7 @@ void Orientation::claimedCb(GObject* proxy, GAsyncResult* result, void* data) {
 }
 
 void Orientation::report() {
-  const base::OwnedVariant value(g_dbus_proxy_get_cached_property(_proxy, kProperty));
+  const common::OwnedVariant value(g_dbus_proxy_get_cached_property(_proxy, kProperty));
   if (!value || !g_variant_is_of_type(value.get(), G_VARIANT_TYPE_STRING)) return;
   const int degrees = degreesOf(g_variant_get_string(value.get(), nullptr));
   if (degrees >= 0) _changed(degrees);

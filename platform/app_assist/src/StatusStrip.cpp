@@ -1,6 +1,6 @@
 #include "StatusStrip.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <net_connection.h>
 #include <vconf-keys.h>
 
@@ -38,13 +38,13 @@ connection_type_e currentNetwork() {
 
 /// Percent as the kernel writes it, empty without a battery.
 std::string batteryCharge() {
-  const base::Owned<GDir, g_dir_close> folder(g_dir_open(kPowerSupplies, 0, nullptr));
+  const common::Owned<GDir, g_dir_close> folder(g_dir_open(kPowerSupplies, 0, nullptr));
   while (const char* name = folder ? g_dir_read_name(folder.get()) : nullptr) {
     if (strncmp(name, "BAT", 3) != 0) continue;
     char* text = nullptr;
-    const base::OwnedText path(g_build_filename(kPowerSupplies, name, "capacity", nullptr));
+    const common::OwnedText path(g_build_filename(kPowerSupplies, name, "capacity", nullptr));
     if (!g_file_get_contents(path.get(), &text, nullptr, nullptr)) continue;
-    const base::OwnedText owned(g_strchomp(text));
+    const common::OwnedText owned(g_strchomp(text));
     return owned.get();
   }
   return {};

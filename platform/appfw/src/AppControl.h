@@ -20,7 +20,7 @@ struct app_control_s {
 
 namespace appfw {
 
-using OwnedAppControl = base::Owned<app_control_s, app_control_destroy>;
+using OwnedAppControl = common::Owned<app_control_s, app_control_destroy>;
 
 constexpr const char* kKeyOperation = "__APP_SVC_OP_TYPE__";
 constexpr const char* kKeyUri = "__APP_SVC_URI__";

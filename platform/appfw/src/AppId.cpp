@@ -1,5 +1,5 @@
 #include <appfw/AppId.h>
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <cstdlib>
 
@@ -21,7 +21,7 @@ std::string idFromPath(const std::string& path) {
 std::string findId() {
   const char* set = getenv("APPFW_APP_ID");
   if (set && *set) return set;
-  base::OwnedText path(g_file_read_link("/proc/self/exe", nullptr));
+  common::OwnedText path(g_file_read_link("/proc/self/exe", nullptr));
   return path ? idFromPath(path.get()) : std::string();
 }
 

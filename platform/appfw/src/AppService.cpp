@@ -87,7 +87,7 @@ void AppService::launch(const char* sender, GVariant* arguments,
   GVariant* contents = nullptr;
   const char* replyPath = nullptr;
   g_variant_get(arguments, "(@a{sv}&o)", &contents, &replyPath);
-  base::OwnedVariant owned(contents);
+  common::OwnedVariant owned(contents);
   const bool replyWanted = std::string_view(replyPath) != "/";
 
   Request request(new app_control_s);

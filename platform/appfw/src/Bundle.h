@@ -1,8 +1,8 @@
 /// What a bundle is made of.
 #pragma once
 
-#include <base/Owned.h>
 #include <bundle.h>
+#include <common/Owned.h>
 
 #include <list>
 #include <string>
@@ -41,5 +41,5 @@ struct _bundle_t {
 };
 
 namespace appfw {
-using OwnedBundle = base::Owned<bundle, bundle_free>;
+using OwnedBundle = common::Owned<bundle, bundle_free>;
 }

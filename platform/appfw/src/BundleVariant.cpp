@@ -19,14 +19,14 @@ bool add(bundle& target, const char* key, GVariant* value) {
   }
   if (!g_variant_is_of_type(value, G_VARIANT_TYPE_STRING_ARRAY)) return false;
   gsize count = 0;
-  base::Owned<const char*, g_free> texts(g_variant_get_strv(value, &count));
+  common::Owned<const char*, g_free> texts(g_variant_get_strv(value, &count));
   return target.add(key, std::vector<std::string>(texts.get(), texts.get() + count));
 }
 
 }  // namespace
 
 std::string utf8(const std::string& text) {
-  base::OwnedText valid(g_utf8_make_valid(text.c_str(), static_cast<gssize>(text.size())));
+  common::OwnedText valid(g_utf8_make_valid(text.c_str(), static_cast<gssize>(text.size())));
   return valid.get();
 }
 

@@ -3,7 +3,7 @@
 namespace appfw {
 namespace {
 
-using base::OwnedVariant;
+using common::OwnedVariant;
 
 constexpr std::string_view kPrefix = "phoneapp.i";
 constexpr int kBusTimeoutMs = 1000;
@@ -15,11 +15,11 @@ OwnedVariant askBus(GDBusConnection* bus, const char* method, GVariant* argument
       arguments, nullptr, G_DBUS_CALL_FLAGS_NONE, kBusTimeoutMs, nullptr, nullptr));
 }
 
-base::Owned<const char*, g_free> names(GVariant* answer) {
+common::Owned<const char*, g_free> names(GVariant* answer) {
   if (!answer) return nullptr;
   OwnedVariant list(g_variant_get_child_value(answer, 0));
   // The texts live as long as the answer does.
-  return base::Owned<const char*, g_free>(g_variant_get_strv(list.get(), nullptr));
+  return common::Owned<const char*, g_free>(g_variant_get_strv(list.get(), nullptr));
 }
 
 bool answeredWith(GVariant* answer, const std::string& name) {

@@ -12,7 +12,7 @@
 namespace appfw {
 namespace {
 
-using OwnedBuilder = base::Owned<JsonBuilder, g_object_unref>;
+using OwnedBuilder = common::Owned<JsonBuilder, g_object_unref>;
 
 void addMember(JsonBuilder* builder, const char* name, const std::string& value) {
   json_builder_set_member_name(builder, name);
@@ -53,8 +53,8 @@ std::string line(const bundle& request) {
   json_builder_end_array(builder.get());
   json_builder_end_object(builder.get());
 
-  base::Owned<JsonNode, json_node_unref> root(json_builder_get_root(builder.get()));
-  base::OwnedText text(json_to_string(root.get(), FALSE));
+  common::Owned<JsonNode, json_node_unref> root(json_builder_get_root(builder.get()));
+  common::OwnedText text(json_to_string(root.get(), FALSE));
   return std::string(text.get()) + '\n';
 }
 

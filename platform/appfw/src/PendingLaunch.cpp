@@ -8,10 +8,10 @@
 namespace appfw {
 namespace {
 
-using base::Out;
-using base::OwnedError;
-using base::OwnedMessage;
-using base::OwnedVariant;
+using common::Out;
+using common::OwnedError;
+using common::OwnedMessage;
+using common::OwnedVariant;
 
 constexpr int kDeliveryTimeoutMs = 15000;
 
@@ -42,14 +42,14 @@ app_control_result_e resultOf(int number) {
 
 }  // namespace
 
-void PendingLaunch::start(base::OwnedBus bus, std::string name, GVariant* contents,
+void PendingLaunch::start(common::OwnedBus bus, std::string name, GVariant* contents,
                           LaunchEvents events) {
   auto* launch = new PendingLaunch(std::move(bus), std::move(name), contents, std::move(events));
   launch->listenForReply();
   launch->send();
 }
 
-PendingLaunch::PendingLaunch(base::OwnedBus bus, std::string name, GVariant* contents,
+PendingLaunch::PendingLaunch(common::OwnedBus bus, std::string name, GVariant* contents,
                              LaunchEvents events)
     : _bus(std::move(bus)),
       _name(std::move(name)),

@@ -4,7 +4,7 @@
 #include "Bundle.h"
 
 #include <appfw/Launch.h>
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <string>
 
@@ -13,13 +13,14 @@ namespace appfw {
 class PendingLaunch {
  public:
   /// `contents` is a{sv}. The object deletes itself when nothing more is to come.
-  static void start(base::OwnedBus bus, std::string name, GVariant* contents, LaunchEvents events);
+  static void start(common::OwnedBus bus, std::string name, GVariant* contents,
+                    LaunchEvents events);
   ~PendingLaunch();
   PendingLaunch(const PendingLaunch&) = delete;
   PendingLaunch& operator=(const PendingLaunch&) = delete;
 
  private:
-  PendingLaunch(base::OwnedBus bus, std::string name, GVariant* contents, LaunchEvents events);
+  PendingLaunch(common::OwnedBus bus, std::string name, GVariant* contents, LaunchEvents events);
 
   static void sentCb(GObject* bus, GAsyncResult* result, void* data);
   static void vanishedCb(GDBusConnection* bus, const char* name, void* data);
@@ -34,9 +35,9 @@ class PendingLaunch {
   void replied(const char* sender, GVariant* arguments, GDBusMethodInvocation* invocation);
   void finish(app_control_result_e result, OwnedBundle reply);
 
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
   const std::string _name;
-  base::OwnedVariant _contents;
+  common::OwnedVariant _contents;
   LaunchEvents _events;
   std::string _replyPath = "/";
   std::string _callee;  ///< its unique name, once it has the request

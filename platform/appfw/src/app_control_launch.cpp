@@ -44,10 +44,10 @@ LaunchEvents eventsFor(app_control_h request, app_control_reply_cb callback, voi
 }  // namespace
 
 int launch(const std::string& appId, const bundle& request, LaunchEvents events) {
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   if (!bus) return APP_CONTROL_ERROR_LAUNCH_FAILED;
   if (!isInstalled(bus.get(), appId)) return APP_CONTROL_ERROR_APP_NOT_FOUND;
-  base::OwnedVariant contents(g_variant_ref_sink(toVariant(request)));
+  common::OwnedVariant contents(g_variant_ref_sink(toVariant(request)));
   if (g_variant_get_size(contents.get()) > kMaxBundleBytes) {
     dlog_print(DLOG_ERROR, "APPFW", "request for %s is larger than %zu bytes", appId.c_str(),
                kMaxBundleBytes);
@@ -77,9 +77,9 @@ int app_control_reply_to_launch_request(app_control_h reply, app_control_h reque
   if (!reply || !request || request->replyPath.empty() || !known) {
     return APP_CONTROL_ERROR_INVALID_PARAMETER;
   }
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   if (!bus) return APP_CONTROL_ERROR_LAUNCH_FAILED;
-  base::OwnedVariant contents(g_variant_ref_sink(appfw::toVariant(*reply->data)));
+  common::OwnedVariant contents(g_variant_ref_sink(appfw::toVariant(*reply->data)));
   if (g_variant_get_size(contents.get()) > appfw::kMaxBundleBytes) {
     return APP_CONTROL_ERROR_LAUNCH_REJECTED;
   }

@@ -4,9 +4,9 @@
 namespace base {
 namespace {
 
-OwnedBus connect(GBusType type, const char* name) {
-  OwnedError error;
-  OwnedBus bus(g_bus_get_sync(type, nullptr, Out(error)));
+common::OwnedBus connect(GBusType type, const char* name) {
+  common::OwnedError error;
+  common::OwnedBus bus(g_bus_get_sync(type, nullptr, common::Out(error)));
   if (!bus) dlog_print(DLOG_ERROR, "PLATFORM", "no %s bus: %s", name, error->message);
   return bus;
 }
@@ -14,22 +14,22 @@ OwnedBus connect(GBusType type, const char* name) {
 /// The bus works through a connection's messages in order: once it has answered this one, it has
 /// dealt with those before.
 void waitUntilSeen(GDBusConnection* bus) {
-  OwnedVariant answer(g_dbus_connection_call_sync(
+  common::OwnedVariant answer(g_dbus_connection_call_sync(
       bus, "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "GetId",
       nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, 1000, nullptr, nullptr));
 }
 
 }  // namespace
 
-OwnedBus sessionBus() {
+common::OwnedBus sessionBus() {
   return connect(G_BUS_TYPE_SESSION, "session");
 }
 
-OwnedBus systemBus() {
+common::OwnedBus systemBus() {
   return connect(G_BUS_TYPE_SYSTEM, "system");
 }
 
-SignalSubscription::SignalSubscription(OwnedBus bus, const Match& match,
+SignalSubscription::SignalSubscription(common::OwnedBus bus, const Match& match,
                                        GDBusSignalCallback callback, void* data)
     : _bus(std::move(bus)) {
   if (!_bus) return;

@@ -2,12 +2,9 @@
 
 #include "StoreConnection.h"
 
+#include <common/DamagedDatabase.h>
 #include <dlog.h>
-#include <fcntl.h>
-#include <sys/file.h>
 #include <unistd.h>
-
-#include <cstdio>
 
 namespace base {
 namespace {
@@ -19,33 +16,9 @@ bool damaged(int code) {
 }
 
 std::string folderOf(const std::string& path) {
-  OwnedText folder(g_path_get_dirname(path.c_str()));
+  common::OwnedText folder(g_path_get_dirname(path.c_str()));
   return folder.get();
 }
-
-int checkFile(const std::string& path) {
-  StoreConnection connection;
-  const int code = connection.open(path, false);
-  return code == SQLITE_OK ? connection.check() : code;
-}
-
-/// Holds other processes back while a damaged store is moved aside. Locks the folder, so that no
-/// lock file stays behind.
-class FolderLock {
- public:
-  explicit FolderLock(const std::string& folder)
-      : _fd(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)) {
-    if (_fd >= 0) flock(_fd, LOCK_EX);
-  }
-  ~FolderLock() {
-    if (_fd >= 0) close(_fd);
-  }
-  FolderLock(const FolderLock&) = delete;
-  FolderLock& operator=(const FolderLock&) = delete;
-
- private:
-  int _fd;
-};
 
 }  // namespace
 
@@ -62,20 +35,14 @@ int KeyValueStore::connect(bool create) {
   return code;
 }
 
-/// Looks again under the lock: another process may have put a sound file there meanwhile.
-int KeyValueStore::moveAsideIfDamaged() {
+bool KeyValueStore::moveAsideIfDamaged() {
   _connection.reset();
-  FolderLock lock(folderOf(_path));
-  const int code = checkFile(_path);
-  if (!damaged(code)) return code;
-  dlog_print(DLOG_ERROR, kTag, "%s is damaged; it becomes .corrupt and a new one is begun",
-             _path.c_str());
-  for (const char* part : {"", "-wal", "-shm"}) {
-    if (rename((_path + part).c_str(), (_path + ".corrupt" + part).c_str()) != 0 && !*part) {
-      return SQLITE_CANTOPEN;
-    }
+  const common::Examined examined = common::examineDatabase(_path, _path + ".corrupt");
+  if (examined == common::Examined::SetAside) {
+    dlog_print(DLOG_ERROR, kTag, "%s was damaged; it is now .corrupt and a new one is begun",
+               _path.c_str());
   }
-  return SQLITE_OK;
+  return examined != common::Examined::Unusable;
 }
 
 template <typename Operation>
@@ -86,10 +53,9 @@ KeyValueStore::Answer KeyValueStore::run(bool create, Operation operation) {
     return code == SQLITE_OK ? operation(*_connection) : code;
   };
   int code = attempt();
-  if (damaged(code)) {
-    code = moveAsideIfDamaged();
+  if (damaged(code) && moveAsideIfDamaged()) {
     create = true;
-    if (code == SQLITE_OK) code = attempt();
+    code = attempt();
   }
   if (code == SQLITE_ROW || code == SQLITE_OK) return Answer::Done;
   if (code == SQLITE_DONE) return Answer::NoKey;

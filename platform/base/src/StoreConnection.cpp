@@ -85,15 +85,6 @@ int StoreConnection::prepareAll() {
   return SQLITE_OK;
 }
 
-int StoreConnection::check() {
-  Statement statement;
-  const int code = prepare("PRAGMA quick_check(1)", statement);
-  if (code != SQLITE_OK) return code;
-  const int row = sqlite3_step(statement.get());
-  if (row != SQLITE_ROW) return row;
-  return columnText(statement.get(), 0) == "ok" ? SQLITE_OK : SQLITE_CORRUPT;
-}
-
 int StoreConnection::get(const std::string& key, KeyValueStore::Value& value) {
   Use use(_get.get());
   use.bind(1, key);

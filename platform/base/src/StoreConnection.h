@@ -2,7 +2,7 @@
 #pragma once
 
 #include <base/KeyValueStore.h>
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <sqlite3.h>
 
 #include <string>
@@ -17,7 +17,6 @@ class StoreConnection {
   StoreConnection& operator=(const StoreConnection&) = delete;
 
   int open(const std::string& path, bool create);
-  int check();
 
   /// SQLITE_ROW when there is such a key, else SQLITE_DONE.
   int get(const std::string& key, KeyValueStore::Value& value);
@@ -28,14 +27,15 @@ class StoreConnection {
   int keys(std::vector<std::string>& keys);
 
  private:
-  using Statement = Owned<sqlite3_stmt, sqlite3_finalize>;
+  using Statement = common::Owned<sqlite3_stmt, sqlite3_finalize>;
 
   int execute(const char* sql);
   int switchToWal();
   int prepare(const char* sql, Statement& statement);
   int prepareAll();
 
-  Owned<sqlite3, sqlite3_close> _db;  ///< declared first: closed after its statements are gone
+  common::Owned<sqlite3, sqlite3_close>
+      _db;  ///< declared first: closed after its statements are gone
   Statement _get, _set, _remove, _removeAll, _keys;
 };
 

@@ -8,9 +8,9 @@
 
 namespace {
 
-using base::Out;
-using base::OwnedError;
-using base::OwnedVariant;
+using common::Out;
+using common::OwnedError;
+using common::OwnedVariant;
 
 constexpr const char* kService = "org.freedesktop.NetworkManager";
 constexpr const char* kPath = "/org/freedesktop/NetworkManager";
@@ -38,7 +38,7 @@ class Objects {
   }
 
  private:
-  base::OwnedBus _bus = base::systemBus();
+  common::OwnedBus _bus = base::systemBus();
   const gint64 _deadline = g_get_monotonic_time() + kPatienceUs;
 };
 

@@ -6,8 +6,8 @@
 
 namespace contacts {
 
-using base::Out;
-using base::OwnedError;
+using common::Out;
+using common::OwnedError;
 
 constexpr guint kReopenAfterMs = 500;
 

@@ -38,7 +38,7 @@ class AddressBook {
   void _put(EContact* contact);
   void _changed();
 
-  using OwnedView = base::Owned<EBookClientView, g_object_unref>;
+  using OwnedView = common::Owned<EBookClientView, g_object_unref>;
 
   const std::function<void()> _onChange;
   OwnedBook _book;

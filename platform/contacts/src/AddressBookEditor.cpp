@@ -6,10 +6,10 @@
 
 namespace contacts {
 
-using base::Out;
-using base::Owned;
-using base::OwnedError;
-using base::OwnedText;
+using common::Out;
+using common::Owned;
+using common::OwnedError;
+using common::OwnedText;
 
 struct AddressBookEditor::Private {
   OwnedBook book = openAddressBook();

@@ -6,9 +6,9 @@
 
 namespace contacts {
 
-using base::Out;
-using base::Owned;
-using base::OwnedError;
+using common::Out;
+using common::Owned;
+using common::OwnedError;
 
 constexpr guint32 kDoNotWaitForOnline = static_cast<guint32>(-1);
 

@@ -1,7 +1,7 @@
 /// The phone's address book at Evolution Data Server.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <libebook/libebook.h>
 
 #include <chrono>
@@ -10,13 +10,13 @@ namespace contacts {
 
 constexpr std::chrono::milliseconds kPatience{5000};
 
-using OwnedBook = base::Owned<EBookClient, g_object_unref>;
-using OwnedContact = base::Owned<EContact, g_object_unref>;
+using OwnedBook = common::Owned<EBookClient, g_object_unref>;
+using OwnedContact = common::Owned<EContact, g_object_unref>;
 
 inline void freeContacts(GSList* contacts) {
   g_slist_free_full(contacts, g_object_unref);
 }
-using OwnedContacts = base::Owned<GSList, freeContacts>;
+using OwnedContacts = common::Owned<GSList, freeContacts>;
 
 /// Null, with a log line, when it cannot be reached in time.
 OwnedBook openAddressBook();

@@ -1,7 +1,7 @@
 /// Cancels a synchronous call that takes too long. The main loop cannot do that: it is waiting.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <chrono>
 #include <condition_variable>
@@ -20,7 +20,7 @@ class Deadline {
   GCancellable* cancellable() const { return _cancellable.get(); }
 
  private:
-  base::Owned<GCancellable, g_object_unref> _cancellable;
+  common::Owned<GCancellable, g_object_unref> _cancellable;
   std::mutex _mutex;
   std::condition_variable _done;
   bool _isDone = false;

@@ -1,15 +1,15 @@
 #include "Person.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <dlog.h>
 
 namespace contacts {
 namespace {
 
-using base::Out;
-using base::Owned;
-using base::OwnedError;
-using base::OwnedText;
+using common::Out;
+using common::Owned;
+using common::OwnedError;
+using common::OwnedText;
 
 void freeAttributes(GList* attributes) {
   g_list_free_full(attributes, reinterpret_cast<GDestroyNotify>(e_vcard_attribute_free));

@@ -1,4 +1,4 @@
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <contacts.h>
 
 #include <algorithm>

@@ -1,4 +1,4 @@
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <contacts.h>
 
 #include <cstring>
@@ -16,7 +16,7 @@ bool isNumber(unsigned int property) {
 }
 
 std::string folded(const std::string& text) {
-  const base::OwnedText fold(g_utf8_casefold(text.c_str(), -1));
+  const common::OwnedText fold(g_utf8_casefold(text.c_str(), -1));
   return fold.get();
 }
 

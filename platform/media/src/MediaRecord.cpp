@@ -1,6 +1,6 @@
 #include "MediaRecord.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include "ThumbnailQueue.h"
 
@@ -11,8 +11,8 @@ constexpr const char* kAttributes = G_FILE_ATTRIBUTE_STANDARD_TYPE
     "," G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE "," G_FILE_ATTRIBUTE_TIME_MODIFIED
     "," G_FILE_ATTRIBUTE_THUMBNAIL_PATH;
 
-using OwnedFile = base::Owned<GFile, g_object_unref>;
-using OwnedInfo = base::Owned<GFileInfo, g_object_unref>;
+using OwnedFile = common::Owned<GFile, g_object_unref>;
+using OwnedInfo = common::Owned<GFileInfo, g_object_unref>;
 
 OwnedInfo query(const std::string& path, const char* attributes) {
   const OwnedFile file(g_file_new_for_path(path.c_str()));
@@ -36,7 +36,7 @@ std::string currentThumbnail(GFileInfo* info) {
 std::string mimeTypeOf(GFileInfo* info) {
   const char* type =
       g_file_info_get_attribute_string(info, G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE);
-  const base::OwnedText mimeType(type ? g_content_type_get_mime_type(type) : nullptr);
+  const common::OwnedText mimeType(type ? g_content_type_get_mime_type(type) : nullptr);
   return mimeType ? mimeType.get() : "application/octet-stream";
 }
 

@@ -23,7 +23,7 @@ class ThumbnailQueue {
     // A file without a picture leaves no trace in the cache: without this memory every look at it
     // would ask again.
     if (!_asked.insert(path).second) return;
-    const base::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
+    const common::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
     if (!uri) return;
     if (_pending.empty()) g_idle_add(_sendCb, this);
     _pending.push_back({uri.get(), mimeType});
@@ -45,9 +45,9 @@ class ThumbnailQueue {
       g_variant_builder_add(&types, "s", request.mimeType.c_str());
     }
     _pending.clear();
-    const base::OwnedVariant arguments(
+    const common::OwnedVariant arguments(
         g_variant_ref_sink(g_variant_new("(asasssu)", &uris, &types, "large", "foreground", 0u)));
-    const base::OwnedBus bus = base::sessionBus();
+    const common::OwnedBus bus = base::sessionBus();
     if (!bus) return;
     g_dbus_connection_call(bus.get(), kService, kPath, kService, "Queue", arguments.get(), nullptr,
                            G_DBUS_CALL_FLAGS_NONE, kTimeoutMs, nullptr, nullptr, nullptr);

@@ -1,14 +1,14 @@
 /// Which program of the phone opens a file, by what the file contains.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <gio/gdesktopappinfo.h>
 
 #include <string>
 
 namespace mime {
 
-using OwnedAppInfo = base::Owned<GAppInfo, g_object_unref>;
+using OwnedAppInfo = common::Owned<GAppInfo, g_object_unref>;
 
 /// The MIME type of a file's content; its name only refines it (a zip archive that is named .docx).
 /// Empty when the file may not be opened: not a plain readable file, a link, executable, a script,

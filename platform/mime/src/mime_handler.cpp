@@ -12,7 +12,7 @@ namespace {
 
 constexpr std::size_t kSniffBytes = 4096;
 
-using base::OwnedText;
+using common::OwnedText;
 
 class File {
  public:

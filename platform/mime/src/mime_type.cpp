@@ -1,4 +1,4 @@
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <mime_type.h>
 
 #include <cstring>
@@ -6,7 +6,7 @@
 
 namespace {
 
-using base::OwnedText;
+using common::OwnedText;
 
 // Where the shared database means something else by the extension than a phone does.
 struct Override {

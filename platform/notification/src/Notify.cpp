@@ -6,8 +6,8 @@ namespace notification {
 
 void notify(GDBusConnection* bus, const Message& message, GAsyncReadyCallback callback,
             void* data) {
-  base::OwnedText valid(g_utf8_make_valid(message.text.c_str(), -1));
-  base::OwnedText body(g_markup_escape_text(valid.get(), -1));
+  common::OwnedText valid(g_utf8_make_valid(message.text.c_str(), -1));
+  common::OwnedText body(g_markup_escape_text(valid.get(), -1));
   GVariantBuilder actions, hints;
   g_variant_builder_init(&actions, G_VARIANT_TYPE_STRING_ARRAY);
   g_variant_builder_init(&hints, G_VARIANT_TYPE_VARDICT);
@@ -27,9 +27,9 @@ void notify(GDBusConnection* bus, const Message& message, GAsyncReadyCallback ca
 }
 
 unsigned finishNotify(GObject* bus, GAsyncResult* result) {
-  base::OwnedError error;
-  base::OwnedVariant answer(
-      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, base::Out(error)));
+  common::OwnedError error;
+  common::OwnedVariant answer(
+      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, common::Out(error)));
   guint32 number = 0;
   if (answer) {
     g_variant_get(answer.get(), "(u)", &number);

@@ -1,7 +1,7 @@
 /// The one call to the notification daemon.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <string>
 

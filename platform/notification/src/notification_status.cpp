@@ -19,7 +19,7 @@ void shownCb(GObject* bus, GAsyncResult* result, void*) {
 
 int notification_status_message_post(const char* message) {
   if (!message || !*message) return NOTIFICATION_ERROR_INVALID_PARAMETER;
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   if (!bus) return NOTIFICATION_ERROR_FROM_DBUS;
   notification::Message status;
   status.text = message;

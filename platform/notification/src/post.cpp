@@ -64,7 +64,7 @@ void shownCb(GObject* bus, GAsyncResult* result, void* data) {
 }  // namespace
 
 bool post(const std::string& text, OnOpen onOpen) {
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   if (text.empty() || !bus) return false;
   openActions();  // listens before the daemon can speak
   Message message;

@@ -3,8 +3,8 @@
 #include <base/PhonePaths.h>
 #include <ovu.h>
 
+#include <common/Database.h>
 #include "SimCard.h"
-#include "store.h"
 
 namespace ovu {
 namespace {
@@ -34,13 +34,13 @@ void report(bool* failed) {
 }  // namespace
 
 struct AccountStore::Private {
-  std::unique_ptr<store::Database> database;
+  std::unique_ptr<common::Database> database;
 };
 
 AccountStore::AccountStore() : AccountStore(base::databaseFolder() + "/account.db") {}
 
 AccountStore::AccountStore(const std::string& path) : _d(new Private) {
-  _d->database = store::Database::open(path, kSchema);
+  _d->database = common::Database::open(path, kSchema);
 }
 
 AccountStore::~AccountStore() = default;

@@ -10,7 +10,7 @@ constexpr const char* kModem = "org.freedesktop.ModemManager1.Modem";
 constexpr const char* kSim = "org.freedesktop.ModemManager1.Sim";
 constexpr int kTimeoutMs = 1000;
 
-using base::OwnedVariant;
+using common::OwnedVariant;
 
 OwnedVariant call(GDBusConnection* bus, const char* path, const char* interface, const char* method,
                   GVariant* arguments, const char* replyType) {
@@ -38,7 +38,7 @@ std::string firstSimPath(GVariant* objects) {
 }  // namespace
 
 std::string simCardImsi() {
-  const base::OwnedBus bus = base::systemBus();
+  const common::OwnedBus bus = base::systemBus();
   if (!bus) return {};
   const auto managed =
       call(bus.get(), "/org/freedesktop/ModemManager1", "org.freedesktop.DBus.ObjectManager",

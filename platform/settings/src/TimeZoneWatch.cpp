@@ -49,7 +49,7 @@ TimeZoneWatch::~TimeZoneWatch() {
 }
 
 std::string TimeZoneWatch::current() {
-  base::Owned<GTimeZone, g_time_zone_unref> zone(g_time_zone_new_local());
+  common::Owned<GTimeZone, g_time_zone_unref> zone(g_time_zone_new_local());
   return g_time_zone_get_identifier(zone.get());
 }
 
@@ -57,7 +57,7 @@ void TimeZoneWatch::changedCb(GDBusConnection*, const char*, const char*, const 
                               GVariant* arguments, void* data) {
   if (!g_variant_is_of_type(arguments, G_VARIANT_TYPE("(sa{sv}as)"))) return;
   auto* self = static_cast<TimeZoneWatch*>(data);
-  base::OwnedVariant changed(g_variant_get_child_value(arguments, 1));
+  common::OwnedVariant changed(g_variant_get_child_value(arguments, 1));
   const char* zone = nullptr;
   if (g_variant_lookup(changed.get(), kZone, "&s", &zone)) {
     self->apply(zone);
@@ -73,13 +73,13 @@ void TimeZoneWatch::ask() {
 }
 
 void TimeZoneWatch::answeredCb(GObject* bus, GAsyncResult* result, void* data) {
-  base::OwnedError error;
-  base::OwnedVariant answer(
-      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, base::Out(error)));
+  common::OwnedError error;
+  common::OwnedVariant answer(
+      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, common::Out(error)));
   if (!answer) return;  // no such service, or the watch has gone
   GVariant* boxed = nullptr;
   g_variant_get(answer.get(), "(v)", &boxed);
-  base::OwnedVariant zone(boxed);
+  common::OwnedVariant zone(boxed);
   if (g_variant_is_of_type(boxed, G_VARIANT_TYPE_STRING)) {
     static_cast<TimeZoneWatch*>(data)->apply(g_variant_get_string(boxed, nullptr));
   }

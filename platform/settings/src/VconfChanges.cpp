@@ -12,9 +12,9 @@ char* vconf_keynode_get_name(keynode_t* node) {
 
 /// Flushed, since whoever sets a key may be a tool that ends right afterwards.
 void VconfChanges::announce(const std::string& key) {
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   if (!bus) return;
-  base::OwnedText text(g_utf8_make_valid(key.c_str(), -1));
+  common::OwnedText text(g_utf8_make_valid(key.c_str(), -1));
   g_dbus_connection_emit_signal(bus.get(), nullptr, kPath, kInterface, kSignal,
                                 g_variant_new("(s)", text.get()), nullptr);
   g_dbus_connection_flush_sync(bus.get(), nullptr, nullptr);

@@ -1,7 +1,7 @@
 #include "Appearance.h"
 
 #include <Edje.h>
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <vconf.h>
 
 #include <algorithm>
@@ -15,7 +15,7 @@ constexpr const char* kThemeKey = "db/setting/theme";
 constexpr const char* kTextSizeKey = "db/setting/accessibility/font_size";
 
 Style currentStyle() {
-  const base::Owned<char, free> name(vconf_get_str(kThemeKey));
+  const common::Owned<char, free> name(vconf_get_str(kThemeKey));
   return name && strcmp(name.get(), "dark") == 0 ? Style::Dark : Style::Light;
 }
 

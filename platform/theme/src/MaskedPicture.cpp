@@ -1,6 +1,6 @@
 #include "MaskedPicture.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <dlog.h>
 #include <gdk-pixbuf/gdk-pixbuf.h>
 
@@ -15,7 +15,7 @@ constexpr int kMaxSide = 4096;
 /// A picture that claims more is not decoded at all.
 constexpr int64_t kMaxPixels = 100'000'000;
 
-using OwnedPixbuf = base::Owned<GdkPixbuf, g_object_unref>;
+using OwnedPixbuf = common::Owned<GdkPixbuf, g_object_unref>;
 
 Pixels pixelsOf(const GdkPixbuf* pixbuf) {
   return {gdk_pixbuf_read_pixels(pixbuf),
@@ -66,7 +66,7 @@ OwnedPixbuf loadMask(const char* path) {
   Size own{};
   GdkPixbufFormat* format = usableFormat(path, &own);
   if (!format) return nullptr;
-  const base::OwnedText name(gdk_pixbuf_format_get_name(format));
+  const common::OwnedText name(gdk_pixbuf_format_get_name(format));
   if (g_strcmp0(name.get(), "png") != 0) return nullptr;
   return OwnedPixbuf(gdk_pixbuf_new_from_file(path, nullptr));
 }

@@ -1,6 +1,6 @@
 #include "TableFile.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <dlog.h>
 #include <libxml/parser.h>
 
@@ -17,7 +17,7 @@ xmlDoc* parse(const char* path) {
   char* text = nullptr;
   size_t length = 0;
   if (!g_file_get_contents(path, &text, &length, nullptr)) return nullptr;
-  const base::OwnedText owned(text);
+  const common::OwnedText owned(text);
   if (length > kMaxBytes) return nullptr;
   return xmlReadMemory(text, static_cast<int>(length), nullptr, nullptr,
                        XML_PARSE_NONET | XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
@@ -26,7 +26,7 @@ xmlDoc* parse(const char* path) {
 }  // namespace
 
 std::unique_ptr<TableFile> TableFile::read(const char* path, const char* root) {
-  base::Owned<xmlDoc, xmlFreeDoc> document(path ? parse(path) : nullptr);
+  common::Owned<xmlDoc, xmlFreeDoc> document(path ? parse(path) : nullptr);
   // A table needs no document type, and a document type can make a small file a large one.
   if (document && !document->intSubset) {
     xmlNode* element = xmlDocGetRootElement(document.get());

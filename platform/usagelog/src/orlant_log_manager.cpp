@@ -4,7 +4,7 @@
 
 #include <memory>
 
-#include "store.h"
+#include <common/Database.h>
 
 namespace {
 
@@ -30,29 +30,24 @@ void deleteReply(gpointer data) {
   delete static_cast<Reply*>(data);
 }
 
-void bindField(store::Statement& statement, bundle* data, const char* key) {
+std::optional<std::string> field(bundle* data, const char* key) {
   char* value = nullptr;
-  if (bundle_get_str(data, key, &value) == 0 && value) {
-    statement.bind(std::string(value));
-  } else {
-    statement.bindNull();
-  }
+  if (bundle_get_str(data, key, &value) != 0 || !value) return std::nullopt;
+  return value;
 }
 
-bool insert(store::Database& database, const char* uri, bundle* data) {
+bool insert(common::Database& database, const char* uri, bundle* data) {
   auto statement = database.prepare(
       "INSERT INTO record(time, uri, app_id, feature, extra) VALUES(?, ?, ?, ?, ?)");
   statement.bind(g_get_real_time() / G_TIME_SPAN_MILLISECOND).bind(std::string(uri));
-  for (const char* key : {"app_id", "feature", "extra"}) {
-    bindField(statement, data, key);
-  }
+  for (const char* key : {"app_id", "feature", "extra"}) statement.bind(field(data, key));
   return statement.run();
 }
 
 }  // namespace
 
 struct orlant_log_manager_s {
-  std::unique_ptr<store::Database> database;
+  std::unique_ptr<common::Database> database;
   int lastRequest = 0;
   std::shared_ptr<bool> alive = std::make_shared<bool>(true);
 };
@@ -60,7 +55,7 @@ struct orlant_log_manager_s {
 int orlant_log_manager_create(orlant_log_manager_h* handle) {
   if (!handle) return ORLANT_LOG_ERROR_INVALID_PARAMETER;
   *handle = nullptr;
-  auto database = store::Database::open(base::databaseFolder() + "/usagelog.db", kSchema);
+  auto database = common::Database::open(base::databaseFolder() + "/usagelog.db", kSchema);
   if (!database) return ORLANT_LOG_ERROR_STORE;
   *handle = new orlant_log_manager_s{std::move(database)};
   return ORLANT_LOG_ERROR_NONE;

@@ -11,20 +11,21 @@ namespace {
 constexpr guint kDeadlineMs = 15000;
 
 std::string credentials(const std::string& msisdn, const std::string& imsi) {
-  const base::Owned<JsonBuilder, g_object_unref> json(json_builder_new());
+  const common::Owned<JsonBuilder, g_object_unref> json(json_builder_new());
   json_builder_begin_object(json.get());
   json_builder_set_member_name(json.get(), "msisdn");
   json_builder_add_string_value(json.get(), msisdn.c_str());
   json_builder_set_member_name(json.get(), "imsi");
   json_builder_add_string_value(json.get(), imsi.c_str());
   json_builder_end_object(json.get());
-  const JsonTree root(json_builder_get_root(json.get()));
-  return writeJson(root.get());
+  const common::JsonTree root(json_builder_get_root(json.get()));
+  return common::writeJson(root.get());
 }
 
 std::string textOf(const ServiceClient::Reply& reply, const char* member) {
-  const JsonTree json = reply.error ? nullptr : reply.json();
-  const auto text = json ? textMember(json_node_get_object(json.get()), member) : std::nullopt;
+  const common::JsonTree json = reply.error ? nullptr : reply.json();
+  const auto text =
+      json ? common::textMember(json_node_get_object(json.get()), member) : std::nullopt;
   return text.value_or("");
 }
 

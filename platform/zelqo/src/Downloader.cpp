@@ -13,9 +13,9 @@ constexpr std::size_t kMaxAddress = 2048;
 // Addresses let their holder in, so the log does not get them whole.
 std::string nameInLog(const std::string& url) {
   constexpr std::size_t shown = 24;
-  const base::OwnedText text(
+  const common::OwnedText text(
       g_utf8_make_valid(url.c_str(), static_cast<gssize>(std::min(url.size(), shown))));
-  const base::OwnedText escaped(g_strescape(text.get(), nullptr));
+  const common::OwnedText escaped(g_strescape(text.get(), nullptr));
   return std::string(escaped.get()) + (url.size() > shown ? "…" : "");
 }
 

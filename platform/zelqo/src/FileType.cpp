@@ -1,6 +1,6 @@
 #include "FileType.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <array>
 #include <cstdio>
@@ -16,16 +16,16 @@ constexpr std::array<std::pair<const char*, const char*>, 2> kOverrides = {
     {{".ts", "video/mp2t"}, {".3ga", "audio/3gpp"}}};
 
 std::string mimeOf(const char* name, const std::string& head) {
-  const base::OwnedText content(g_content_type_guess(
+  const common::OwnedText content(g_content_type_guess(
       name, reinterpret_cast<const guchar*>(head.empty() ? nullptr : head.data()), head.size(),
       nullptr));
-  const base::OwnedText mime(g_content_type_get_mime_type(content.get()));
+  const common::OwnedText mime(g_content_type_get_mime_type(content.get()));
   return mime ? mime.get() : "application/octet-stream";
 }
 
 std::string headOf(const std::string& path) {
   std::string head(kHead, '\0');
-  const base::Owned<FILE, fclose> file(fopen(path.c_str(), "rbe"));
+  const common::Owned<FILE, fclose> file(fopen(path.c_str(), "rbe"));
   head.resize(file ? fread(head.data(), 1, head.size(), file.get()) : 0);
   return head;
 }
@@ -33,8 +33,8 @@ std::string headOf(const std::string& path) {
 }  // namespace
 
 std::string fileType(const std::string& path) {
-  const base::OwnedText name(g_path_get_basename(path.c_str()));
-  const base::OwnedText lower(g_ascii_strdown(name.get(), -1));
+  const common::OwnedText name(g_path_get_basename(path.c_str()));
+  const common::OwnedText lower(g_ascii_strdown(name.get(), -1));
   for (const auto& [suffix, type] : kOverrides) {
     if (g_str_has_suffix(lower.get(), suffix)) return type;
   }

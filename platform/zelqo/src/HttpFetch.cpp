@@ -19,7 +19,7 @@ SessionOwner makeSession(int connections, guint inactivityS) {
 
 MessageOwner makeMessage(const char* method, const std::string& url) {
   if (url.rfind("http://", 0) != 0 && url.rfind("https://", 0) != 0) return nullptr;
-  const base::Owned<GUri, g_uri_unref> uri(
+  const common::Owned<GUri, g_uri_unref> uri(
       g_uri_parse(url.c_str(), static_cast<GUriFlags>(SOUP_HTTP_URI_FLAGS), nullptr));
   const char* host = uri ? g_uri_get_host(uri.get()) : nullptr;
   return MessageOwner(host && *host ? soup_message_new_from_uri(method, uri.get()) : nullptr);
@@ -50,9 +50,9 @@ HttpFetch* HttpFetch::claim(gpointer data) {
 }
 
 void HttpFetch::sentCb(GObject* session, GAsyncResult* result, gpointer data) {
-  base::OwnedError error;
-  base::Owned<GInputStream, g_object_unref> stream(
-      soup_session_send_finish(SOUP_SESSION(session), result, base::Out(error)));
+  common::OwnedError error;
+  common::Owned<GInputStream, g_object_unref> stream(
+      soup_session_send_finish(SOUP_SESSION(session), result, common::Out(error)));
   HttpFetch* fetch = claim(data);
   if (!fetch) return;
   if (!stream) {
@@ -69,9 +69,9 @@ void HttpFetch::readMore() {
 }
 
 void HttpFetch::readCb(GObject* stream, GAsyncResult* result, gpointer data) {
-  base::OwnedError error;
-  const base::Owned<GBytes, g_bytes_unref> bytes(
-      g_input_stream_read_bytes_finish(G_INPUT_STREAM(stream), result, base::Out(error)));
+  common::OwnedError error;
+  const common::Owned<GBytes, g_bytes_unref> bytes(
+      g_input_stream_read_bytes_finish(G_INPUT_STREAM(stream), result, common::Out(error)));
   HttpFetch* fetch = claim(data);
   if (!fetch) return;
   if (!bytes) {

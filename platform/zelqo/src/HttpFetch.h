@@ -3,7 +3,7 @@
 
 #include <libsoup/soup.h>
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <functional>
 #include <memory>
@@ -13,8 +13,8 @@
 
 namespace zelqo {
 
-using SessionOwner = base::Owned<SoupSession, g_object_unref>;
-using MessageOwner = base::Owned<SoupMessage, g_object_unref>;
+using SessionOwner = common::Owned<SoupSession, g_object_unref>;
+using MessageOwner = common::Owned<SoupMessage, g_object_unref>;
 
 /// At most `connections` at a time; `inactivityS` without a byte ends a request.
 SessionOwner makeSession(int connections, guint inactivityS);
@@ -65,8 +65,8 @@ class HttpFetch {
   Sink _sink;
   Done _done;
   Self _self;
-  base::Owned<GCancellable, g_object_unref> _cancellable;
-  base::Owned<GInputStream, g_object_unref> _stream;
+  common::Owned<GCancellable, g_object_unref> _cancellable;
+  common::Owned<GInputStream, g_object_unref> _stream;
   goffset _received = 0;
   guint _deadline = 0;
 };

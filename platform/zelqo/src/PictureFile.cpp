@@ -1,6 +1,6 @@
 #include "PictureFile.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <dirent.h>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -23,7 +23,7 @@ constexpr time_t kLeftoverAgeS = 600;
 constexpr std::size_t kHashDigits = 40;
 
 std::string hashOf(const std::string& url) {
-  const base::OwnedText sum(g_compute_checksum_for_string(G_CHECKSUM_SHA256, url.c_str(), -1));
+  const common::OwnedText sum(g_compute_checksum_for_string(G_CHECKSUM_SHA256, url.c_str(), -1));
   return std::string(sum.get()).substr(0, kHashDigits);
 }
 
@@ -79,7 +79,7 @@ PictureFile::Result PictureFile::finish() {
 }
 
 void PictureFile::removeLeftovers(const std::string& folder) {
-  const base::Owned<DIR, closedir> entries(opendir(folder.c_str()));
+  const common::Owned<DIR, closedir> entries(opendir(folder.c_str()));
   const time_t now = time(nullptr);
   while (const dirent* entry = entries ? readdir(entries.get()) : nullptr) {
     struct stat status;

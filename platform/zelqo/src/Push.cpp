@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <cctype>
 
-#include "JsonText.h"
+#include <common/Json.h>
 
 namespace zelqo {
 namespace {
@@ -21,7 +21,7 @@ bool isToken(const std::string& text) {
 }
 
 std::optional<std::string> boundedText(JsonObject* object, const char* name) {
-  auto text = textMember(object, name);
+  auto text = common::textMember(object, name);
   if (text && text->size() > kMaxText) return std::nullopt;
   return text;
 }
@@ -32,7 +32,7 @@ ReceivedFile readFile(JsonNode* node) {
   if (!JSON_NODE_HOLDS_OBJECT(node)) return file;
   JsonObject* object = json_node_get_object(node);
   file.name = boundedText(object, "name");
-  file.size = numberMember(object, "size");
+  file.size = common::numberMember(object, "size");
   if (file.size && *file.size < 0) file.size.reset();
   file.type = boundedText(object, "type");
   file.url = boundedText(object, "url");
@@ -43,15 +43,15 @@ ReceivedFile readFile(JsonNode* node) {
 }
 
 bool readShare(JsonObject* object, ReceivedShare& share) {
-  const auto sender = textMember(object, "from");
-  const auto expires = numberMember(object, "expires_ms");
-  JsonArray* files = arrayMember(object, "files");
+  const auto sender = common::textMember(object, "from");
+  const auto expires = common::numberMember(object, "expires_ms");
+  JsonArray* files = common::arrayMember(object, "files");
   if (!sender || sender->empty() || sender->size() > kMaxNumber || !expires || !files) {
     return false;
   }
   share.sender = *sender;
-  share.single = flagMember(object, "single");
-  share.createdMs = numberMember(object, "created_ms").value_or(0);
+  share.single = common::flagMember(object, "single");
+  share.createdMs = common::numberMember(object, "created_ms").value_or(0);
   share.expiresMs = *expires;
   const guint count = std::min(json_array_get_length(files), kMaxFiles);
   share.files.reserve(count);
@@ -64,8 +64,8 @@ bool readShare(JsonObject* object, ReceivedShare& share) {
 std::optional<PushEvent> readEvent(JsonNode* node) {
   if (!JSON_NODE_HOLDS_OBJECT(node)) return std::nullopt;
   JsonObject* object = json_node_get_object(node);
-  const auto kind = textMember(object, "kind");
-  const auto token = textMember(object, "token");
+  const auto kind = common::textMember(object, "kind");
+  const auto token = common::textMember(object, "token");
   if (!kind || !token || !isToken(*token)) return std::nullopt;
   PushEvent event;
   event.share.token = *token;
@@ -73,7 +73,7 @@ std::optional<PushEvent> readEvent(JsonNode* node) {
     event.kind = PushEvent::Kind::Recalled;
     return event;
   }
-  JsonObject* share = objectMember(object, "share");
+  JsonObject* share = common::objectMember(object, "share");
   if (*kind != "received" || !share || !readShare(share, event.share)) return std::nullopt;
   event.share.base = boundedText(object, "base").value_or("");
   return event;
@@ -82,10 +82,10 @@ std::optional<PushEvent> readEvent(JsonNode* node) {
 }  // namespace
 
 std::optional<Push> readPush(std::string_view json) {
-  const JsonTree root = parseJsonObject(json);
+  const common::JsonTree root = common::parseJsonObject(json);
   JsonObject* object = root ? json_node_get_object(root.get()) : nullptr;
-  JsonArray* events = object ? arrayMember(object, "events") : nullptr;
-  const auto cursor = object ? numberMember(object, "cursor") : std::nullopt;
+  JsonArray* events = object ? common::arrayMember(object, "events") : nullptr;
+  const auto cursor = object ? common::numberMember(object, "cursor") : std::nullopt;
   if (!events || !cursor || *cursor < 0) return std::nullopt;
   Push push;
   push.cursor = *cursor;

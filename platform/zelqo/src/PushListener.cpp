@@ -54,7 +54,7 @@ void PushListener::signUp() {
 }
 
 void PushListener::poll() {
-  const base::OwnedText number(g_uri_escape_string(_msisdn.c_str(), nullptr, FALSE));
+  const common::OwnedText number(g_uri_escape_string(_msisdn.c_str(), nullptr, FALSE));
   ServiceClient::Request request;
   request.path = std::string("/v1/push?msisdn=") + number.get() +
                  "&after=" + std::to_string(_store.pushCursor(_msisdn));

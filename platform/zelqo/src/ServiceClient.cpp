@@ -10,16 +10,16 @@ namespace {
 constexpr int kConnections = 6;
 
 void attachJson(SoupMessage* message, const std::string& json) {
-  const base::Owned<GBytes, g_bytes_unref> bytes(g_bytes_new(json.data(), json.size()));
+  const common::Owned<GBytes, g_bytes_unref> bytes(g_bytes_new(json.data(), json.size()));
   soup_message_set_request_body_from_bytes(message, "application/json", bytes.get());
 }
 
 bool attachFile(SoupMessage* message, const std::string& path) {
-  const base::Owned<GFile, g_object_unref> file(g_file_new_for_path(path.c_str()));
-  base::OwnedError error;
-  const base::Owned<GFileInputStream, g_object_unref> stream(
-      g_file_read(file.get(), nullptr, base::Out(error)));
-  const base::Owned<GFileInfo, g_object_unref> info(
+  const common::Owned<GFile, g_object_unref> file(g_file_new_for_path(path.c_str()));
+  common::OwnedError error;
+  const common::Owned<GFileInputStream, g_object_unref> stream(
+      g_file_read(file.get(), nullptr, common::Out(error)));
+  const common::Owned<GFileInfo, g_object_unref> info(
       stream ? g_file_input_stream_query_info(stream.get(), G_FILE_ATTRIBUTE_STANDARD_SIZE, nullptr,
                                               nullptr)
              : nullptr);
@@ -33,8 +33,9 @@ bool attachFile(SoupMessage* message, const std::string& path) {
 }
 
 std::string errorText(const std::string& body, const std::string& fallback) {
-  const JsonTree json = parseJsonObject(body);
-  const auto text = json ? textMember(json_node_get_object(json.get()), "error") : std::nullopt;
+  const common::JsonTree json = common::parseJsonObject(body);
+  const auto text =
+      json ? common::textMember(json_node_get_object(json.get()), "error") : std::nullopt;
   return text.value_or(fallback);
 }
 

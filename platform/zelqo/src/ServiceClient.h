@@ -6,8 +6,8 @@
 #include <memory>
 #include <string>
 
+#include <common/Json.h>
 #include "HttpFetch.h"
-#include "JsonText.h"
 
 namespace zelqo {
 
@@ -19,7 +19,7 @@ class ServiceClient {
     std::string reason;  ///< of an error, for people who read logs
     std::string body;    ///< at most 8 MiB
     std::string cursor;  ///< of a push, where to go on even when its body is of no use
-    JsonTree json() const { return parseJsonObject(body); }
+    common::JsonTree json() const { return common::parseJsonObject(body); }
   };
   using ReplyCb = std::function<void(Reply)>;
 

@@ -9,34 +9,8 @@
 namespace zelqo {
 namespace {
 
-using store::Database;
-using store::Statement;
-
-void bindOptional(Statement& statement, const std::optional<std::string>& text) {
-  if (text) {
-    statement.bind(*text);
-  } else {
-    statement.bindNull();
-  }
-}
-
-void bindOptional(Statement& statement, const std::optional<std::int64_t>& number) {
-  if (number) {
-    statement.bind(*number);
-  } else {
-    statement.bindNull();
-  }
-}
-
-std::optional<std::string> textAt(const Statement& row, int column) {
-  if (row.isNull(column)) return std::nullopt;
-  return row.text(column);
-}
-
-std::optional<std::int64_t> numberAt(const Statement& row, int column) {
-  if (row.isNull(column)) return std::nullopt;
-  return row.number(column);
-}
+using common::Database;
+using common::Statement;
 
 bool runWith(Database& database, const char* sql, const std::string& text) {
   return database.prepare(sql).bind(text).run();
@@ -53,10 +27,10 @@ bool insertFiles(Database& database, const ReceivedShare& share) {
         "INSERT INTO received_file(token, position, name, size, type, url, thumb, mid, big) "
         "VALUES(?, ?, ?, ?, ?, ?, ?, ?, ?)");
     insert.bind(share.token).bind(position++);
-    bindOptional(insert, file.name);
-    bindOptional(insert, file.size);
+    insert.bind(file.name);
+    insert.bind(file.size);
     for (const auto* text : {&file.type, &file.url, &file.thumb, &file.mid, &file.big}) {
-      bindOptional(insert, *text);
+      insert.bind(*text);
     }
     if (!insert.run()) return false;
   }
@@ -97,7 +71,7 @@ bool readReceived(Database& database, const std::string& token,
     share->single = row.number(2) != 0;
     share->createdMs = row.number(3);
     share->expiresMs = row.number(4);
-    share->recalledMs = numberAt(row, 5);
+    share->recalledMs = row.optionalNumber(5);
   }
   return !row.failed();
 }
@@ -108,8 +82,9 @@ bool readFiles(Database& database, const std::string& token, std::vector<Receive
       "ORDER BY position");
   rows.bind(token);
   while (rows.step()) {
-    files.push_back({textAt(rows, 0), numberAt(rows, 1), textAt(rows, 2), textAt(rows, 3),
-                     textAt(rows, 4), textAt(rows, 5), textAt(rows, 6)});
+    files.push_back({rows.optionalText(0), rows.optionalNumber(1), rows.optionalText(2),
+                     rows.optionalText(3), rows.optionalText(4), rows.optionalText(5),
+                     rows.optionalText(6)});
   }
   return !rows.failed();
 }
@@ -126,7 +101,7 @@ bool readSent(Database& database, std::int64_t requestId, std::optional<SentShar
     share->single = row.number(2) != 0;
     share->createdMs = row.number(3);
     share->expiresMs = row.number(4);
-    share->recalledMs = numberAt(row, 5);
+    share->recalledMs = row.optionalNumber(5);
   }
   return !row.failed();
 }
@@ -145,7 +120,7 @@ bool listReceived(Database& database, std::vector<ShareSummary>& list) {
     summary.single = rows.number(2) != 0;
     summary.createdMs = rows.number(3);
     summary.expiresMs = rows.number(4);
-    summary.recalledMs = numberAt(rows, 5);
+    summary.recalledMs = rows.optionalNumber(5);
     summary.fileCount = rows.number(6);
     summary.firstFile = rows.text(7);
   }
@@ -166,7 +141,7 @@ bool listSent(Database& database, std::vector<ShareSummary>& list) {
     summary.single = rows.number(2) != 0;
     summary.createdMs = rows.number(3);
     summary.expiresMs = rows.number(4);
-    summary.recalledMs = numberAt(rows, 5);
+    summary.recalledMs = rows.optionalNumber(5);
     summary.fileCount = rows.number(6);
     summary.firstFile = rows.text(7);
     done = readTexts(database, kRecipients, summary.requestId, summary.numbers);
@@ -227,7 +202,7 @@ bool Store::addReceived(const ReceivedShare& share) {
         .bind(std::int64_t{share.single})
         .bind(share.createdMs)
         .bind(share.expiresMs);
-    bindOptional(insert, share.recalledMs);
+    insert.bind(share.recalledMs);
     return insert.run() && insertFiles(database, share);
   });
 }
@@ -244,7 +219,7 @@ bool Store::addSent(const SentShare& share) {
         .bind(std::int64_t{share.single})
         .bind(share.createdMs)
         .bind(share.expiresMs);
-    bindOptional(insert, share.recalledMs);
+    insert.bind(share.recalledMs);
     return insert.run() &&
            runWith(database, "DELETE FROM sent_recipient WHERE request_id = ?", id) &&
            runWith(database, "DELETE FROM sent_file WHERE request_id = ?", id) &&

@@ -1,13 +1,10 @@
 #include "StoreFile.h"
 
-#include <base/Owned.h>
+#include <common/DamagedDatabase.h>
+#include <common/Owned.h>
 #include <fcntl.h>
-#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
-
-#include <cerrno>
-#include <cstdio>
 
 namespace zelqo {
 namespace {
@@ -37,31 +34,13 @@ CREATE TABLE IF NOT EXISTS account(
   push_cursor INTEGER NOT NULL DEFAULT 0) WITHOUT ROWID;
 )";
 
-// Held while a damaged file is looked at and moved, so that of two processes that find it damaged
-// the second does not move away the new one.
-class MoveLock {
- public:
-  explicit MoveLock(const std::string& path)
-      : _fd(::open((path + ".lock").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, kPrivateFile)) {
-    if (_fd >= 0) flock(_fd, LOCK_EX);
-  }
-  ~MoveLock() {
-    if (_fd >= 0) close(_fd);
-  }
-  MoveLock(const MoveLock&) = delete;
-  MoveLock& operator=(const MoveLock&) = delete;
-
- private:
-  int _fd;
-};
-
 }  // namespace
 
 StoreFile::StoreFile(std::string path) : _path(std::move(path)) {}
 
 StoreFile::~StoreFile() = default;
 
-store::Database* StoreFile::database() {
+common::Database* StoreFile::database() {
   if (_database && isReplaced()) _database.reset();
   if (!_database) open();
   if (!_database) {
@@ -72,12 +51,12 @@ store::Database* StoreFile::database() {
 }
 
 void StoreFile::open() {
-  const base::OwnedText folder(g_path_get_dirname(_path.c_str()));
+  const common::OwnedText folder(g_path_get_dirname(_path.c_str()));
   g_mkdir_with_parents(folder.get(), kPrivate);
   // The account's key lies in it; SQLite gives its other files the mode of this one.
   const int fd = ::open(_path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, kPrivateFile);
   if (fd >= 0) close(fd);
-  _database = store::Database::open(_path, kSchema);
+  _database = common::Database::open(_path, kSchema);
   struct stat status;
   if (!_database || stat(_path.c_str(), &status) != 0) return;
   _device = status.st_dev;
@@ -90,36 +69,10 @@ bool StoreFile::isReplaced() const {
 }
 
 void StoreFile::examine() {
-  const MoveLock lock(_path);
-  if (!isDamaged()) return;
   _database.reset();
-  moveAside();
-}
-
-// A fresh connection: what an open one says depends on what it has read before.
-bool StoreFile::isDamaged() const {
-  sqlite3* handle = nullptr;
-  int result = sqlite3_open_v2(_path.c_str(), &handle, SQLITE_OPEN_READWRITE, nullptr);
-  const base::Owned<sqlite3, sqlite3_close> owner(handle);
-  if (result != SQLITE_OK) return false;
-  sqlite3_stmt* prepared = nullptr;
-  result = sqlite3_prepare_v2(handle, "PRAGMA quick_check(1)", -1, &prepared, nullptr);
-  const base::Owned<sqlite3_stmt, sqlite3_finalize> check(prepared);
-  if (result == SQLITE_OK) result = sqlite3_step(prepared);
-  if (result == SQLITE_ROW) {
-    const auto* verdict = reinterpret_cast<const char*>(sqlite3_column_text(prepared, 0));
-    return g_strcmp0(verdict, "ok") != 0;
-  }
-  return result == SQLITE_NOTADB || result == SQLITE_CORRUPT;
-}
-
-void StoreFile::moveAside() {
   const std::string aside = _path + ".damaged-" + std::to_string(g_get_real_time() / 1000);
-  g_warning("zelqo: the store is damaged and was moved to %s", aside.c_str());
-  for (const char* part : {"", "-wal", "-shm"}) {
-    if (rename((_path + part).c_str(), (aside + part).c_str()) != 0 && errno != ENOENT) {
-      g_warning("zelqo: cannot move %s%s: %s", _path.c_str(), part, g_strerror(errno));
-    }
+  if (common::examineDatabase(_path, aside) == common::Examined::SetAside) {
+    g_warning("zelqo: the store is damaged and was moved to %s", aside.c_str());
   }
 }
 

@@ -6,7 +6,7 @@
 #include <memory>
 #include <string>
 
-#include "store.h"
+#include <common/Database.h>
 
 namespace zelqo {
 
@@ -18,18 +18,16 @@ class StoreFile {
   StoreFile& operator=(const StoreFile&) = delete;
 
   /// Null when it can be neither opened nor begun anew.
-  store::Database* database();
+  common::Database* database();
   /// An operation has failed: a damaged file is moved aside, and the next call begins a new one.
   void examine();
 
  private:
   bool isReplaced() const;
-  bool isDamaged() const;
-  void moveAside();
   void open();
 
   std::string _path;
-  std::unique_ptr<store::Database> _database;
+  std::unique_ptr<common::Database> _database;
   dev_t _device = 0;
   ino_t _inode = 0;
 };

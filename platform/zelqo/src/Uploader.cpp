@@ -19,7 +19,7 @@ constexpr guint kAccepted = 202;
 constexpr guint kUnauthorized = 401;
 constexpr std::int64_t kMaxFileSize = 0xffffffff;
 
-using Builder = base::Owned<JsonBuilder, g_object_unref>;
+using Builder = common::Owned<JsonBuilder, g_object_unref>;
 
 void addText(JsonBuilder* json, const char* member, const std::string& text) {
   json_builder_set_member_name(json, member);
@@ -32,8 +32,8 @@ void addNumber(JsonBuilder* json, const char* member, std::int64_t number) {
 }
 
 std::string nameOf(const std::string& path) {
-  const base::OwnedText name(g_path_get_basename(path.c_str()));
-  const base::OwnedText valid(g_utf8_make_valid(name.get(), -1));
+  const common::OwnedText name(g_path_get_basename(path.c_str()));
+  const common::OwnedText valid(g_utf8_make_valid(name.get(), -1));
   return valid.get();
 }
 
@@ -82,7 +82,7 @@ void Uploader::begin() {
 
 bool Uploader::checkRequest() {
   if (_request.rawFiles.empty()) return true;
-  const JsonTree raw(json_from_string(_request.rawFiles.c_str(), nullptr));
+  const common::JsonTree raw(json_from_string(_request.rawFiles.c_str(), nullptr));
   if (raw && JSON_NODE_HOLDS_ARRAY(raw.get())) return true;
   fail(ZELQO_ERROR_INVALID_PARAMETER, "the raw manifest is no JSON array");
   return false;
@@ -144,8 +144,8 @@ std::string Uploader::announcement() const {
     json_builder_end_array(json.get());
   }
   json_builder_end_object(json.get());
-  const JsonTree root(json_builder_get_root(json.get()));
-  return writeJson(root.get());
+  const common::JsonTree root(json_builder_get_root(json.get()));
+  return common::writeJson(root.get());
 }
 
 void Uploader::announce() {
@@ -167,10 +167,10 @@ void Uploader::announce() {
 }
 
 void Uploader::announced(const std::string& body) {
-  const JsonTree json = parseJsonObject(body);
+  const common::JsonTree json = common::parseJsonObject(body);
   JsonObject* object = json ? json_node_get_object(json.get()) : nullptr;
-  const auto token = object ? textMember(object, "token") : std::nullopt;
-  const auto id = object ? numberMember(object, "request_id") : std::nullopt;
+  const auto token = object ? common::textMember(object, "token") : std::nullopt;
+  const auto id = object ? common::numberMember(object, "request_id") : std::nullopt;
   if (!token || !id) {
     fail(ZELQO_ERROR_REFUSED, "the service's answer makes no sense");
     return;
@@ -218,9 +218,9 @@ void Uploader::complete() {
     } else if (reply.status == kAccepted) {
       complete();  // pictures are still being made
     } else {
-      const JsonTree json = reply.json();
+      const common::JsonTree json = reply.json();
       JsonObject* object = json ? json_node_get_object(json.get()) : nullptr;
-      if (object) _result.expiresMs = numberMember(object, "expires_ms").value_or(0);
+      if (object) _result.expiresMs = common::numberMember(object, "expires_ms").value_or(0);
       keep();
     }
   });

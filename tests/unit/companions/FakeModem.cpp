@@ -44,7 +44,7 @@ FakeModem::FakeModem(const std::string& imsi)
                                     node->interfaces[1], &sim, &_imsi, nullptr, nullptr);
   g_dbus_node_info_unref(node);
   g_main_context_pop_thread_default(_context);
-  const base::OwnedVariant answer(g_dbus_connection_call_sync(
+  const common::OwnedVariant answer(g_dbus_connection_call_sync(
       _bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
       "RequestName", g_variant_new("(su)", kService, 4u), nullptr, G_DBUS_CALL_FLAGS_NONE, -1,
       nullptr, nullptr));

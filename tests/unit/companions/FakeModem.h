@@ -22,5 +22,5 @@ class FakeModem {
   GThread* _thread;
   GMainContext* _context;
   GMainLoop* _loop;
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
 };

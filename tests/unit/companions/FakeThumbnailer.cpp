@@ -18,7 +18,7 @@ FakeThumbnailer::FakeThumbnailer() : _bus(otherConnection()) {
   g_dbus_connection_register_object(_bus.get(), "/org/freedesktop/thumbnails/Thumbnailer1",
                                     node->interfaces[0], &calls, this, nullptr, nullptr);
   g_dbus_node_info_unref(node);
-  const base::OwnedVariant answer(g_dbus_connection_call_sync(
+  const common::OwnedVariant answer(g_dbus_connection_call_sync(
       _bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
       "RequestName", g_variant_new("(su)", "org.freedesktop.thumbnails.Thumbnailer1", 4u), nullptr,
       G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
@@ -33,10 +33,10 @@ void FakeThumbnailer::_callCb(GDBusConnection*, const char*, const char*, const 
                               GVariant* arguments, GDBusMethodInvocation* invocation, void* data) {
   auto* self = static_cast<FakeThumbnailer*>(data);
   self->_calls++;
-  base::Owned<GVariantIter, g_variant_iter_free> uris;
-  base::Owned<GVariantIter, g_variant_iter_free> types;
-  g_variant_get(arguments, "(asas&s&su)", static_cast<GVariantIter**>(base::Out(uris)),
-                static_cast<GVariantIter**>(base::Out(types)), nullptr, nullptr, nullptr);
+  common::Owned<GVariantIter, g_variant_iter_free> uris;
+  common::Owned<GVariantIter, g_variant_iter_free> types;
+  g_variant_get(arguments, "(asas&s&su)", static_cast<GVariantIter**>(common::Out(uris)),
+                static_cast<GVariantIter**>(common::Out(types)), nullptr, nullptr, nullptr);
   const char* text = nullptr;
   while (g_variant_iter_next(uris.get(), "&s", &text)) self->_uris.emplace_back(text);
   while (g_variant_iter_next(types.get(), "&s", &text)) self->_types.emplace_back(text);

@@ -22,7 +22,7 @@ class FakeThumbnailer {
                       const char* interface, const char* method, GVariant* arguments,
                       GDBusMethodInvocation* invocation, void* data);
 
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
   int _calls = 0;
   std::vector<std::string> _uris;
   std::vector<std::string> _types;

@@ -82,8 +82,8 @@ class TheMediaDatabase : public testing::Test {
 
   // Where the desktop's thumbnailer would put it.
   static std::string makeThumbnail(const std::string& path) {
-    const base::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
-    const base::OwnedText hash(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.get(), -1));
+    const common::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
+    const common::OwnedText hash(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.get(), -1));
     const std::string cache = std::string(g_get_user_cache_dir()) + "/thumbnails/large";
     fs::create_directories(cache);
     const std::string thumbnail = cache + "/" + hash.get() + ".png";

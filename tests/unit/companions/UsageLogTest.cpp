@@ -5,8 +5,8 @@
 #include <filesystem>
 #include <vector>
 
+#include <common/Database.h>
 #include "../platform/TestPhone.h"
-#include "store.h"
 
 namespace {
 
@@ -30,8 +30,8 @@ class TheUsageLog : public testing::Test {
   }
   ~TheUsageLog() override { orlant_log_manager_destroy(handle); }
 
-  static std::unique_ptr<store::Database> database() {
-    return store::Database::open(TestPhone::root() + "/dbspace/usagelog.db", "SELECT 1");
+  static std::unique_ptr<common::Database> database() {
+    return common::Database::open(TestPhone::root() + "/dbspace/usagelog.db", "SELECT 1");
   }
 
   int insert(const std::vector<std::pair<const char*, const char*>>& members, int* request) {
@@ -61,7 +61,7 @@ TEST_F(TheUsageLog, StoresOneRowPerRecordInOrder) {
   EXPECT_GT(rows.number(4), 1600000000000);
   ASSERT_TRUE(rows.step());
   EXPECT_EQ(rows.text(2), "ZQ57");
-  EXPECT_TRUE(rows.isNull(3));
+  EXPECT_FALSE(rows.optionalText(3));
   EXPECT_FALSE(rows.step());
 }
 

@@ -1,6 +1,6 @@
 // The address book, as applications see it. Runs on a phone: the address book is the phone's own.
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <contacts.h>
 #include <contacts/AddressBookEditor.h>
 #include <gtest/gtest.h>
@@ -170,9 +170,9 @@ TEST_F(Contacts, GivesThePictureAsTheNameOfAFile) {
   const Texts pictures = find(_contacts_person_number.number, CONTACTS_MATCH_CONTAINS,
                               "+821011112222", _contacts_person_number.image_thumbnail_path);
   ASSERT_EQ(pictures.size(), 1u);
-  base::OwnedText data;
+  common::OwnedText data;
   gsize size = 0;
-  ASSERT_TRUE(g_file_get_contents(pictures[0].c_str(), base::Out(data), &size, nullptr))
+  ASSERT_TRUE(g_file_get_contents(pictures[0].c_str(), common::Out(data), &size, nullptr))
       << pictures[0];
   EXPECT_EQ(std::string(data.get(), size), std::string(kPng, sizeof kPng));
 }

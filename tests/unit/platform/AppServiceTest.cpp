@@ -25,7 +25,7 @@ class Stranger {
         appfw::kAppInterface, "Launch", g_variant_new("(@a{sv}o)", bundle, replyPath), nullptr,
         G_DBUS_CALL_FLAGS_NONE, -1, nullptr,
         [](GObject* bus, GAsyncResult* result, void* data) {
-          base::OwnedVariant value(
+          common::OwnedVariant value(
               g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, nullptr));
           *static_cast<Answer*>(data) = {true, value != nullptr};
         },
@@ -35,7 +35,7 @@ class Stranger {
   }
 
  private:
-  base::OwnedBus _bus = otherConnection();
+  common::OwnedBus _bus = otherConnection();
 };
 
 GVariant* parse(const char* text) {
@@ -156,8 +156,8 @@ TEST_F(AnAppService, RefusesAFloodBeforeItIsReady) {
 }
 
 TEST_F(AnAppService, SaysWhenTheNameIsLost) {
-  base::OwnedBus bus = base::sessionBus();
-  base::OwnedVariant answer(g_dbus_connection_call_sync(
+  common::OwnedBus bus = base::sessionBus();
+  common::OwnedVariant answer(g_dbus_connection_call_sync(
       bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
       "ReleaseName", g_variant_new("(s)", appfw::busName(TestPhone::kAppId).c_str()), nullptr,
       G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
@@ -165,19 +165,19 @@ TEST_F(AnAppService, SaysWhenTheNameIsLost) {
 }
 
 TEST(AnAppServiceThatIsNotAlone, DoesNotStart) {
-  base::OwnedBus other = otherConnection();
+  common::OwnedBus other = otherConnection();
   ASSERT_TRUE(appfw::requestName(other.get(), appfw::busName("test.taken"), 4));
   appfw::AppService service("test.taken");
   EXPECT_FALSE(service.start([] {}));
 }
 
 TEST(AnAppServiceWhoseNameAToolUses, TakesItOver) {
-  base::OwnedBus other = otherConnection();
+  common::OwnedBus other = otherConnection();
   constexpr unsigned allowReplacement = 1;
   ASSERT_TRUE(appfw::requestName(other.get(), appfw::busName("test.borrowed"), allowReplacement));
   appfw::AppService service("test.borrowed");
   EXPECT_TRUE(service.start([] {}));
   const std::string tool = g_dbus_connection_get_unique_name(other.get());
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   EXPECT_EQ(appfw::findCaller(bus.get(), tool.c_str()).appId, "test.borrowed");
 }

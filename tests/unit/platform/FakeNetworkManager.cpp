@@ -4,7 +4,7 @@
 
 FakeNetworkManager::FakeNetworkManager() : _bus(otherConnection()) {
   g_dbus_connection_add_filter(_bus.get(), filterCb, this, nullptr);
-  base::OwnedVariant answer(g_dbus_connection_call_sync(
+  common::OwnedVariant answer(g_dbus_connection_call_sync(
       _bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
       "RequestName", g_variant_new("(su)", "org.freedesktop.NetworkManager", 0u), nullptr,
       G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
@@ -28,7 +28,7 @@ GDBusMessage* FakeNetworkManager::filterCb(GDBusConnection* bus, GDBusMessage* m
   const char* member = g_dbus_message_get_member(message);
   if (!incoming || !member || std::string(member) != "GetAll") return message;
   if (!self->_silent) {
-    base::OwnedMessage answer(self->answer(message));
+    common::OwnedMessage answer(self->answer(message));
     g_dbus_connection_send_message(bus, answer.get(), G_DBUS_SEND_MESSAGE_FLAGS_NONE, nullptr,
                                    nullptr);
   }

@@ -2,7 +2,7 @@
 /// waits.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <map>
 #include <string>
@@ -26,7 +26,7 @@ class FakeNetworkManager {
                                 void* data);
   GDBusMessage* answer(GDBusMessage* question);
 
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
   std::map<std::string, std::string> _objects;
   bool _silent = false;
 };

@@ -214,7 +214,7 @@ TEST_F(ALaunch, CanOnlyBeAnsweredByTheApplicationThatGotIt) {
   ASSERT_EQ(send("later"), APP_CONTROL_ERROR_NONE);
   ASSERT_TRUE(self.waitFor(1));
 
-  base::OwnedBus own = base::sessionBus(), stranger = otherConnection();
+  common::OwnedBus own = base::sessionBus(), stranger = otherConnection();
   bool refused = false;
   for (int i = 1; i < 200 && !refused; i++) {
     // Reply objects are numbered; a stranger can guess them all.
@@ -227,9 +227,9 @@ TEST_F(ALaunch, CanOnlyBeAnsweredByTheApplicationThatGotIt) {
         g_variant_new_parsed("(0, @a{sv} {'errorMessage': <'forged'>})"), nullptr,
         G_DBUS_CALL_FLAGS_NONE, -1, nullptr,
         [](GObject* bus, GAsyncResult* result, void* data) {
-          base::OwnedError error;
-          base::OwnedVariant value(
-              g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, base::Out(error)));
+          common::OwnedError error;
+          common::OwnedVariant value(
+              g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, common::Out(error)));
           *static_cast<Answer*>(data) = {
               true, g_error_matches(error.get(), G_DBUS_ERROR, G_DBUS_ERROR_ACCESS_DENIED) != 0};
         },

@@ -19,7 +19,7 @@ class FakeDaemon {
 
   FakeDaemon() {
     static const GDBusInterfaceVTable calls = {notifyCb, nullptr, nullptr, {}};
-    base::Owned<GDBusNodeInfo, g_dbus_node_info_unref> node(g_dbus_node_info_new_for_xml(
+    common::Owned<GDBusNodeInfo, g_dbus_node_info_unref> node(g_dbus_node_info_new_for_xml(
         "<node><interface name='org.freedesktop.Notifications'><method name='Notify'>"
         "<arg type='s' direction='in'/><arg type='u' direction='in'/>"
         "<arg type='s' direction='in'/><arg type='s' direction='in'/>"
@@ -29,7 +29,7 @@ class FakeDaemon {
         nullptr));
     g_dbus_connection_register_object(_bus.get(), "/org/freedesktop/Notifications",
                                       node->interfaces[0], &calls, this, nullptr, nullptr);
-    base::OwnedVariant answer(g_dbus_connection_call_sync(
+    common::OwnedVariant answer(g_dbus_connection_call_sync(
         _bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
         "RequestName", g_variant_new("(su)", "org.freedesktop.Notifications", 0u), nullptr,
         G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
@@ -58,7 +58,7 @@ class FakeDaemon {
     auto* self = static_cast<FakeDaemon*>(data);
     Shown shown{};
     const char *summary = nullptr, *body = nullptr;
-    base::Owned<const char*, g_free> actions;
+    common::Owned<const char*, g_free> actions;
     const char** names = nullptr;
     g_variant_get(arguments, "(&su&s&s&s^a&s@a{sv}i)", nullptr, &shown.replaces, nullptr, &summary,
                   &body, &names, nullptr, &shown.timeoutMs);
@@ -71,7 +71,7 @@ class FakeDaemon {
     g_dbus_method_invocation_return_value(invocation, g_variant_new("(u)", number));
   }
 
-  base::OwnedBus _bus = otherConnection();
+  common::OwnedBus _bus = otherConnection();
   unsigned _count = 100;
 };
 

@@ -28,7 +28,7 @@ class ReceivedRequests {
   static std::string caller(app_control_h request);
 
  private:
-  using Request = base::Owned<app_control_s, app_control_destroy>;
+  using Request = common::Owned<app_control_s, app_control_destroy>;
 
   appfw::AppService _service{TestPhone::kAppId};
   std::vector<Request> _requests;

@@ -28,7 +28,7 @@ void earlierCb(keynode_t*, void* data) {
 class FakeTimeService {
  public:
   FakeTimeService() {
-    base::OwnedVariant answer(g_dbus_connection_call_sync(
+    common::OwnedVariant answer(g_dbus_connection_call_sync(
         _bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
         "RequestName", g_variant_new("(su)", "org.freedesktop.timedate1", 0u), nullptr,
         G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
@@ -45,7 +45,7 @@ class FakeTimeService {
   }
 
  private:
-  base::OwnedBus _bus = otherConnection();
+  common::OwnedBus _bus = otherConnection();
 };
 
 class SystemSettings : public testing::Test {

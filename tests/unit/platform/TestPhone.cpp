@@ -24,13 +24,13 @@ GPid startBus(const std::string& config) {
                                  "--print-address=1", "--nosyslog", nullptr};
   GPid pid = 0;
   int output = -1;
-  base::OwnedError error;
+  common::OwnedError error;
   g_spawn_async_with_pipes(
       nullptr, const_cast<char**>(command), nullptr,
       static_cast<GSpawnFlags>(G_SPAWN_SEARCH_PATH | G_SPAWN_DO_NOT_REAP_CHILD |
                                G_SPAWN_STDERR_TO_DEV_NULL),
       [](void*) { prctl(PR_SET_PDEATHSIG, SIGKILL); }, nullptr, &pid, nullptr, &output, nullptr,
-      base::Out(error));
+      common::Out(error));
   std::string address;
   for (char c; read(output, &c, 1) == 1 && c != '\n';) address += c;
   close(output);
@@ -80,8 +80,8 @@ void TestPhone::install(const std::string& appId, const std::string& command) {
   writeFile(root() + "/services/" + name + ".service",
             "[D-BUS Service]\nName=" + name + "\nExec=/usr/bin/env APPFW_APP_ID=" + appId + " " +
                 command + "\n");
-  base::OwnedBus bus = base::sessionBus();
-  base::OwnedVariant done(g_dbus_connection_call_sync(
+  common::OwnedBus bus = base::sessionBus();
+  common::OwnedVariant done(g_dbus_connection_call_sync(
       bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
       "ReloadConfig", nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
 }
@@ -101,13 +101,13 @@ bool waitUntil(const std::function<bool()>& condition) {
 }
 
 void settle() {
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   bool answered = false;
   g_dbus_connection_call(
       bus.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "GetId",
       nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, -1, nullptr,
       [](GObject* source, GAsyncResult* result, void* data) {
-        base::OwnedVariant answer(
+        common::OwnedVariant answer(
             g_dbus_connection_call_finish(G_DBUS_CONNECTION(source), result, nullptr));
         *static_cast<bool*>(data) = true;
       },
@@ -117,8 +117,8 @@ void settle() {
   }
 }
 
-base::OwnedBus otherConnection() {
-  return base::OwnedBus(g_dbus_connection_new_for_address_sync(
+common::OwnedBus otherConnection() {
+  return common::OwnedBus(g_dbus_connection_new_for_address_sync(
       getenv("DBUS_SESSION_BUS_ADDRESS"),
       static_cast<GDBusConnectionFlags>(G_DBUS_CONNECTION_FLAGS_AUTHENTICATION_CLIENT |
                                         G_DBUS_CONNECTION_FLAGS_MESSAGE_BUS_CONNECTION),

@@ -30,7 +30,7 @@ bool waitUntil(const std::function<bool()>& condition);
 /// Runs the main loop until everything sent so far on the shared bus has been dealt with.
 void settle();
 /// A connection of its own, as another process would have.
-base::OwnedBus otherConnection();
+common::OwnedBus otherConnection();
 
 std::string readFile(const std::string& path);
 void writeFile(const std::string& path, const std::string& contents);

@@ -130,7 +130,7 @@ TEST_F(Vconf, KeepsQuietWhenNothingChanges) {
 
 TEST_F(Vconf, IgnoresSignalsOfAnotherShape) {
   vconf_notify_key_changed("test/key", firstCb, &_heard);
-  base::OwnedBus other = otherConnection();
+  common::OwnedBus other = otherConnection();
   g_dbus_connection_emit_signal(other.get(), nullptr, "/phone/Vconf", "phone.Vconf1", "Changed",
                                 g_variant_new("(i)", 7), nullptr);
   g_dbus_connection_flush_sync(other.get(), nullptr, nullptr);

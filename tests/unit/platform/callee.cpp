@@ -82,7 +82,7 @@ GDBusMessage* dieOnLaunch(GDBusConnection*, GDBusMessage* message, gboolean inco
 int main(int argc, char** argv) {
   const std::string mode = argc > 2 ? argv[2] : "";
   const bool first = argc > 1 && isFirstStart(argv[1]);
-  base::OwnedBus bus = base::sessionBus();
+  common::OwnedBus bus = base::sessionBus();
   if (mode == "--quitting" && first) {
     g_dbus_connection_add_filter(bus.get(), dieOnLaunch, nullptr, nullptr);
   }

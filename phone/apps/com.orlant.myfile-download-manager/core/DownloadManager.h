@@ -7,10 +7,10 @@
 #include <string>
 #include <vector>
 
+#include <common/Owned.h>
 #include "Download.h"
 #include "DownloadQueue.h"
 #include "Downloader.h"
-#include "Owned.h"
 #include "SharedIndex.h"
 
 namespace downloads {
@@ -83,7 +83,7 @@ class DownloadManager {
   Observer& _observer;
   DownloadQueue _queue;
   SharedIndex _index;
-  OwnedObject<SoupSession> _session;
+  common::OwnedObject<SoupSession> _session;
   unsigned int _silenceMs = 60000;
   Network _network = Network::None;
   std::map<std::int64_t, Download> _downloads;

@@ -2,7 +2,7 @@
 
 #include <filesystem>
 
-#include "store.h"
+#include <common/Database.h>
 
 namespace downloads {
 namespace {
@@ -13,13 +13,13 @@ constexpr const char* kSchema =
     "sender TEXT NOT NULL, wifi_only INTEGER NOT NULL, state INTEGER NOT NULL, "
     "failure INTEGER NOT NULL, etag TEXT NOT NULL, path TEXT NOT NULL)";
 
-std::unique_ptr<store::Database> open(const std::string& file) {
+std::unique_ptr<common::Database> open(const std::string& file) {
   std::error_code ignored;
   std::filesystem::create_directories(std::filesystem::path(file).parent_path(), ignored);
-  return store::Database::open(file, kSchema);
+  return common::Database::open(file, kSchema);
 }
 
-Download read(const store::Statement& row) {
+Download read(const common::Statement& row) {
   Download download;
   download.id = row.number(0);
   download.url = row.text(1);
@@ -57,12 +57,8 @@ bool DownloadQueue::save(Download& download) {
   auto statement = _database->prepare(
       "INSERT OR REPLACE INTO download(id, url, name, size, token, sender, wifi_only, state, "
       "failure, etag, path) VALUES(?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?)");
-  if (download.id == 0) {
-    statement.bindNull();
-  } else {
-    statement.bind(download.id);
-  }
-  statement.bind(download.url)
+  statement.bind(download.id != 0 ? std::optional(download.id) : std::nullopt)
+      .bind(download.url)
       .bind(download.name)
       .bind(static_cast<std::int64_t>(download.size))
       .bind(download.token)

@@ -6,7 +6,7 @@
 
 #include "Download.h"
 
-namespace store {
+namespace common {
 class Database;
 }
 
@@ -29,7 +29,7 @@ class DownloadQueue {
   bool remove(std::int64_t id);
 
  private:
-  std::unique_ptr<store::Database> _database;
+  std::unique_ptr<common::Database> _database;
 };
 
 }  // namespace downloads

@@ -77,8 +77,9 @@ void Downloader::_request() {
 
 void Downloader::_answeredCb(GObject* session, GAsyncResult* result, gpointer data) {
   GError* raw = nullptr;
-  OwnedObject<GInputStream> stream(soup_session_send_finish(SOUP_SESSION(session), result, &raw));
-  const OwnedError error(raw);
+  common::OwnedObject<GInputStream> stream(
+      soup_session_send_finish(SOUP_SESSION(session), result, &raw));
+  const common::OwnedError error(raw);
   const std::unique_ptr<Link> link(static_cast<Link*>(data));
   if (const auto self = link->lock()) (*self)->_answered(stream.release(), raw);
 }
@@ -152,8 +153,9 @@ void Downloader::_readMore() {
 
 void Downloader::_readCb(GObject* stream, GAsyncResult* result, gpointer data) {
   GError* raw = nullptr;
-  const OwnedBytes bytes(g_input_stream_read_bytes_finish(G_INPUT_STREAM(stream), result, &raw));
-  const OwnedError error(raw);
+  const common::OwnedBytes bytes(
+      g_input_stream_read_bytes_finish(G_INPUT_STREAM(stream), result, &raw));
+  const common::OwnedError error(raw);
   const std::unique_ptr<Link> link(static_cast<Link*>(data));
   if (const auto self = link->lock()) (*self)->_received(bytes.get(), raw);
 }

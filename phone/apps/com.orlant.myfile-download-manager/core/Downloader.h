@@ -7,8 +7,8 @@
 #include <memory>
 #include <string>
 
+#include <common/Owned.h>
 #include "Download.h"
-#include "Owned.h"
 
 namespace downloads {
 
@@ -63,13 +63,13 @@ class Downloader {
   void _endLater(Failure failure);
   void _end(Failure failure);
 
-  OwnedObject<SoupSession> _session;
+  common::OwnedObject<SoupSession> _session;
   Job _job;
   Listener _listener;
   std::unique_ptr<PartFile> _part;
-  OwnedObject<GCancellable> _cancellable;
-  OwnedObject<SoupMessage> _message;
-  OwnedObject<GInputStream> _stream;
+  common::OwnedObject<GCancellable> _cancellable;
+  common::OwnedObject<SoupMessage> _message;
+  common::OwnedObject<GInputStream> _stream;
   std::uint64_t _total = 0;
   bool _triedWithoutRange = false;
   Failure _outcome = Failure::None;

@@ -1,6 +1,6 @@
 #include "FileNamer.h"
 
-#include "Owned.h"
+#include <common/Owned.h>
 
 namespace downloads {
 namespace {
@@ -23,7 +23,7 @@ bool isJoiner(gunichar c) {
 }
 
 std::string visibleCharacters(const std::string& name) {
-  const OwnedText valid(g_utf8_make_valid(name.data(), static_cast<gssize>(name.size())));
+  const common::OwnedText valid(g_utf8_make_valid(name.data(), static_cast<gssize>(name.size())));
   std::string result;
   for (const char* at = valid.get(); *at; at = g_utf8_next_char(at)) {
     const gunichar c = g_utf8_get_char(at);
@@ -51,7 +51,7 @@ std::size_t extensionStart(const std::string& name) {
 
 // Names that mean a device on the computers that the phone's storage may be plugged into.
 bool isReserved(const std::string& name) {
-  const OwnedText upper(g_ascii_strup(name.substr(0, name.find('.')).c_str(), -1));
+  const common::OwnedText upper(g_ascii_strup(name.substr(0, name.find('.')).c_str(), -1));
   const std::string stem = upper.get();
   for (const char* word : {"CON", "PRN", "AUX", "NUL"}) {
     if (stem == word) return true;

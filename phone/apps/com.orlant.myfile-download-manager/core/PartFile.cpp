@@ -7,7 +7,7 @@
 
 #include <cerrno>
 
-#include "Owned.h"
+#include <common/Owned.h>
 
 namespace downloads {
 namespace {
@@ -21,7 +21,7 @@ Failure failureOf(int error) {
 }  // namespace
 
 std::string PartFile::pathFor(const std::string& folder, const std::string& url) {
-  const OwnedText hash(g_compute_checksum_for_string(G_CHECKSUM_SHA256, url.c_str(), -1));
+  const common::OwnedText hash(g_compute_checksum_for_string(G_CHECKSUM_SHA256, url.c_str(), -1));
   return folder + "/." + hash.get() + ".part";
 }
 

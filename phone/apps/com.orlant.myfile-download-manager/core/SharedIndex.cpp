@@ -7,7 +7,7 @@
 
 #include <filesystem>
 
-#include "Owned.h"
+#include <common/Owned.h>
 
 namespace downloads {
 namespace {
@@ -15,7 +15,7 @@ namespace {
 constexpr int kLockTries = 200;
 constexpr gulong kLockPauseUs = 10000;
 
-using OwnedNode = base::Owned<JsonNode, json_node_unref>;
+using OwnedNode = common::Owned<JsonNode, json_node_unref>;
 
 // Kept in a file of its own: the index itself is replaced on every change.
 class WriterLock {
@@ -45,7 +45,7 @@ OwnedNode readObject(const std::string& file) {
   gchar* raw = nullptr;
   gsize length = 0;
   if (!g_file_get_contents(file.c_str(), &raw, &length, nullptr)) return nullptr;
-  const OwnedText text(raw);
+  const common::OwnedText text(raw);
   JsonParser* parser = json_parser_new_immutable();
   OwnedNode root;
   if (json_parser_load_from_data(parser, raw, static_cast<gssize>(length), nullptr)) {
@@ -92,7 +92,7 @@ bool SharedIndex::set(const std::string& url, const std::string& path) {
     return false;
   }
   const auto root = withMember(readObject(_file), url, path);
-  const OwnedText text(json_to_string(root.get(), TRUE));
+  const common::OwnedText text(json_to_string(root.get(), TRUE));
   GError* error = nullptr;
   if (g_file_set_contents_full(_file.c_str(), text.get(), -1, G_FILE_SET_CONTENTS_CONSISTENT, 0644,
                                &error)) {

@@ -23,7 +23,7 @@ DownloadNotifier::DownloadNotifier()
 
 void DownloadNotifier::post(const std::string& message, std::function<void()> onTap) {
   if (!_bus) return;
-  const base::OwnedText body(g_markup_escape_text(message.c_str(), -1));
+  const common::OwnedText body(g_markup_escape_text(message.c_str(), -1));
   GVariantBuilder actions;
   g_variant_builder_init(&actions, G_VARIANT_TYPE_STRING_ARRAY);
   g_variant_builder_add(&actions, "s", "default");
@@ -37,9 +37,9 @@ void DownloadNotifier::post(const std::string& message, std::function<void()> on
 
 void DownloadNotifier::_postedCb(GObject* bus, GAsyncResult* result, gpointer data) {
   const std::unique_ptr<Posted> posted(static_cast<Posted*>(data));
-  base::OwnedError error;
-  const base::OwnedVariant answer(
-      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, base::Out(error)));
+  common::OwnedError error;
+  const common::OwnedVariant answer(
+      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, common::Out(error)));
   if (!answer) {
     g_warning("downloads: no notification: %s", error->message);
     return;

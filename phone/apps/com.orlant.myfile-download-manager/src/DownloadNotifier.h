@@ -23,7 +23,7 @@ class DownloadNotifier {
                          const char* interface, const char* signal, GVariant* arguments,
                          void* data);
 
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
   std::map<unsigned int, std::function<void()>> _handlers;
   base::SignalSubscription _invoked;
 };

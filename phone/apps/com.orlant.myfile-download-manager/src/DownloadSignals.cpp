@@ -5,10 +5,10 @@ namespace downloads {
 void DownloadSignals::_emit(const char* member, const std::string& url) {
   // A bus closes the connection of who sends it anything but UTF-8.
   if (!_bus || !g_utf8_validate(url.c_str(), -1, nullptr)) return;
-  base::OwnedError error;
+  common::OwnedError error;
   g_dbus_connection_emit_signal(_bus.get(), nullptr, "/com/orlant/remoteshare",
                                 "org.tizen.call.remote.share", member,
-                                g_variant_new("(s)", url.c_str()), base::Out(error));
+                                g_variant_new("(s)", url.c_str()), common::Out(error));
   if (error) g_warning("downloads: %s: %s", member, error->message);
 }
 

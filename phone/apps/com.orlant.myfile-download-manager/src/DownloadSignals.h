@@ -21,7 +21,7 @@ class DownloadSignals {
  private:
   void _emit(const char* member, const std::string& url);
 
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
 };
 
 }  // namespace downloads

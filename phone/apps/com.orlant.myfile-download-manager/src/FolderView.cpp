@@ -11,9 +11,9 @@ constexpr const char* kService = "org.freedesktop.FileManager1";
 constexpr int kTimeoutMs = 10000;
 
 void shownCb(GObject* bus, GAsyncResult* result, gpointer) {
-  base::OwnedError error;
-  const base::OwnedVariant answer(
-      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, base::Out(error)));
+  common::OwnedError error;
+  const common::OwnedVariant answer(
+      g_dbus_connection_call_finish(G_DBUS_CONNECTION(bus), result, common::Out(error)));
   if (answer) return;
   g_warning("downloads: no file manager: %s", error->message);
   companion::showMessage(companion::text("There is no file manager on this phone"));
@@ -22,8 +22,8 @@ void shownCb(GObject* bus, GAsyncResult* result, gpointer) {
 }  // namespace
 
 void showInFolder(const std::string& path) {
-  const base::OwnedBus bus = base::sessionBus();
-  const base::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
+  const common::OwnedBus bus = base::sessionBus();
+  const common::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
   if (!bus || !uri) return;
   const char* uris[] = {uri.get(), nullptr};
   g_dbus_connection_call(bus.get(), kService, "/org/freedesktop/FileManager1", kService,

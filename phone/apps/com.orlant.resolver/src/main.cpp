@@ -15,8 +15,8 @@ namespace {
 
 constexpr unsigned int kIdleSeconds = 30;
 
-using OwnedText = base::Owned<char, std::free>;
-using OwnedRequest = base::Owned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
+using OwnedText = common::Owned<char, std::free>;
+using OwnedRequest = common::Owned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
 
 std::string pathOf(app_control_h request) {
   char* raw = nullptr;
@@ -29,10 +29,10 @@ std::string pathOf(app_control_h request) {
 std::string open(const std::string& path) {
   const auto handler = mime::handlerFor(path);
   if (!handler) return "no program for this file";
-  const base::Owned<GFile, g_object_unref> file(g_file_new_for_path(path.c_str()));
+  const common::Owned<GFile, g_object_unref> file(g_file_new_for_path(path.c_str()));
   GList files{file.get(), nullptr, nullptr};
-  base::OwnedError error;
-  g_app_info_launch(handler.get(), &files, nullptr, base::Out(error));
+  common::OwnedError error;
+  g_app_info_launch(handler.get(), &files, nullptr, common::Out(error));
   return error ? error->message : "";
 }
 
@@ -76,7 +76,7 @@ class Resolver {
     return G_SOURCE_REMOVE;
   }
 
-  base::Owned<GMainLoop, g_main_loop_unref> _loop{g_main_loop_new(nullptr, FALSE)};
+  common::Owned<GMainLoop, g_main_loop_unref> _loop{g_main_loop_new(nullptr, FALSE)};
   appfw::AppService _service{appfw::applicationId()};
   guint _idleSource = 0;
 };

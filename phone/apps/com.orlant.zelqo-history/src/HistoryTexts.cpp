@@ -1,6 +1,6 @@
 #include "HistoryTexts.h"
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <companion/Text.h>
 
 using companion::format;
@@ -12,7 +12,7 @@ namespace {
 std::string dateText(std::int64_t ms) {
   GDateTime* time = g_date_time_new_from_unix_local(ms / 1000);
   if (!time) return {};
-  const base::OwnedText date(g_date_time_format(time, "%x"));
+  const common::OwnedText date(g_date_time_format(time, "%x"));
   g_date_time_unref(time);
   return date ? date.get() : "";
 }
@@ -22,7 +22,7 @@ std::string filesText(const zelqo::ShareSummary& share) {
     return format("%d files", static_cast<int>(share.fileCount));
   }
   if (share.firstFile.empty()) return text("1 file");
-  const base::OwnedText name(g_path_get_basename(share.firstFile.c_str()));
+  const common::OwnedText name(g_path_get_basename(share.firstFile.c_str()));
   return name.get();
 }
 

@@ -10,15 +10,15 @@ namespace {
 constexpr double kBurstSeconds = 0.1;
 constexpr const char* kStore = "zelqo.db";
 
-base::Owned<GFileMonitor, g_object_unref> watchFolder(const std::string& folder) {
-  const base::Owned<GFile, g_object_unref> file(g_file_new_for_path(folder.c_str()));
-  return base::Owned<GFileMonitor, g_object_unref>(
+common::Owned<GFileMonitor, g_object_unref> watchFolder(const std::string& folder) {
+  const common::Owned<GFile, g_object_unref> file(g_file_new_for_path(folder.c_str()));
+  return common::Owned<GFileMonitor, g_object_unref>(
       g_file_monitor_directory(file.get(), G_FILE_MONITOR_NONE, nullptr, nullptr));
 }
 
 // The store itself or its write-ahead log. Its index changes with mere reading, ours included.
 bool isOfStore(GFile* file) {
-  const base::OwnedText name(g_file_get_basename(file));
+  const common::OwnedText name(g_file_get_basename(file));
   return std::strcmp(name.get(), kStore) == 0 ||
          std::string(name.get()) == std::string(kStore) + "-wal";
 }

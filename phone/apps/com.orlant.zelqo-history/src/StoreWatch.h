@@ -28,7 +28,7 @@ class StoreWatch {
   void _changed();
 
   std::function<void()> _onChange;
-  base::Owned<GFileMonitor, g_object_unref> _monitor;
+  common::Owned<GFileMonitor, g_object_unref> _monitor;
   base::SignalSubscription _recalled;
   Ecore_Timer* _timer = nullptr;
 };

@@ -2,7 +2,7 @@
 
 #include <app_common.h>
 #include <appfw/AppId.h>
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <cstdlib>
 
@@ -10,7 +10,7 @@ namespace companion {
 namespace {
 
 std::string resource(const std::string& name) {
-  const base::Owned<char, std::free> folder(app_get_resource_path());
+  const common::Owned<char, std::free> folder(app_get_resource_path());
   return (folder ? folder.get() : "") + name;
 }
 

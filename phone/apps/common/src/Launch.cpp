@@ -12,7 +12,7 @@ namespace {
 constexpr const char* kViewer = "com.orlant.zelqo";
 constexpr const char* kLaunchViewer = "http://tizen.org/appcontrol/operation/launch_viewer";
 
-using OwnedMalloc = base::Owned<char, std::free>;
+using OwnedMalloc = common::Owned<char, std::free>;
 
 OwnedRequest newRequest(const char* appId, const char* operation) {
   app_control_h raw = nullptr;

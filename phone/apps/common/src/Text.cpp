@@ -2,7 +2,7 @@
 
 #include <Elementary.h>
 #include <appfw/AppId.h>
-#include <base/Owned.h>
+#include <common/Owned.h>
 #include <libintl.h>
 
 #include <cstdarg>
@@ -26,7 +26,7 @@ std::string format(const char* id, ...) {
   va_start(arguments, id);
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Wformat-nonliteral"
-  const base::OwnedText line(g_strdup_vprintf(text(id), arguments));
+  const common::OwnedText line(g_strdup_vprintf(text(id), arguments));
 #pragma GCC diagnostic pop
   va_end(arguments);
   return line ? line.get() : "";
@@ -40,13 +40,13 @@ std::string sizeText(unsigned long long bytes) {
 }
 
 std::string escape(const std::string& plain) {
-  const base::Owned<char, std::free> markup(
+  const common::Owned<char, std::free> markup(
       evas_textblock_text_utf8_to_markup(nullptr, singleLine(plain).c_str()));
   return markup ? markup.get() : "";
 }
 
 std::string singleLine(const std::string& plain) {
-  const base::OwnedText valid(g_utf8_make_valid(plain.data(), static_cast<gssize>(plain.size())));
+  const common::OwnedText valid(g_utf8_make_valid(plain.data(), static_cast<gssize>(plain.size())));
   std::string line = valid.get();
   for (char& c : line) {
     if (static_cast<unsigned char>(c) < ' ') c = ' ';

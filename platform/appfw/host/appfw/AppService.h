@@ -43,10 +43,10 @@ class AppService {
   void deliverSoon();
   void deliverNext();
 
-  using Request = base::Owned<app_control_s, app_control_destroy>;
+  using Request = common::Owned<app_control_s, app_control_destroy>;
 
   const std::string _appId;
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
   unsigned _object = 0;
   unsigned _idle = 0;
   bool _named = false;

@@ -2,7 +2,7 @@
 /// name may not hold (and '_', and a digit or a dot after a dot) stand as "_xx".
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <string>
 

@@ -1,7 +1,7 @@
 /// Lets a tool launch in an application's name: the receiver sees that application as its caller.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <string>
 
@@ -19,7 +19,7 @@ class CallerName {
   bool isValid() const { return _valid; }
 
  private:
-  base::OwnedBus _bus;
+  common::OwnedBus _bus;
   std::string _name;
   bool _valid = false;
 };

@@ -1,15 +1,15 @@
 /// The phone's buses.
 #pragma once
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <string>
 
 namespace base {
 
 /// This process's shared connection; null, with a log line, when the bus cannot be reached.
-OwnedBus sessionBus();
-OwnedBus systemBus();
+common::OwnedBus sessionBus();
+common::OwnedBus systemBus();
 
 /// Every signal `interface`.`member` on `path`, from whomever, until this object goes away. Null
 /// `member` or `sender` is any. In force when the constructor returns.
@@ -22,13 +22,14 @@ class SignalSubscription {
     const char* path;
     const char* arg0 = nullptr;
   };
-  SignalSubscription(OwnedBus bus, const Match& match, GDBusSignalCallback callback, void* data);
+  SignalSubscription(common::OwnedBus bus, const Match& match, GDBusSignalCallback callback,
+                     void* data);
   ~SignalSubscription();
   SignalSubscription(const SignalSubscription&) = delete;
   SignalSubscription& operator=(const SignalSubscription&) = delete;
 
  private:
-  OwnedBus _bus;
+  common::OwnedBus _bus;
   guint _id = 0;
 };
 

@@ -34,7 +34,7 @@ class KeyValueStore {
   template <typename Operation>
   Answer run(bool create, Operation operation);
   int connect(bool create);
-  int moveAsideIfDamaged();
+  bool moveAsideIfDamaged();
 
   const std::string _path;
   std::unique_ptr<StoreConnection> _connection;

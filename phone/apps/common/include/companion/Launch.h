@@ -3,7 +3,7 @@
 
 #include <app_control.h>
 
-#include <base/Owned.h>
+#include <common/Owned.h>
 
 #include <string>
 #include <type_traits>
@@ -11,7 +11,7 @@
 
 namespace companion {
 
-using OwnedRequest = base::Owned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
+using OwnedRequest = common::Owned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
 
 /// Texts of a request; empty when it has none.
 std::string operationOf(app_control_h request);

@@ -1,6 +1,6 @@
-#include "Json.h"
+#include <common/Json.h>
 
-namespace service {
+namespace common {
 namespace {
 
 constexpr int kMaxDepth = 32;
@@ -37,7 +37,7 @@ JsonTree parseJsonObject(std::string_view text) {
       !isShallow(text)) {
     return nullptr;
   }
-  const Ref<JsonParser> parser(json_parser_new_immutable());
+  const OwnedObject<JsonParser> parser(json_parser_new_immutable());
   if (!json_parser_load_from_data(parser.get(), text.data(), static_cast<gssize>(text.size()),
                                   nullptr)) {
     return nullptr;
@@ -66,6 +66,16 @@ bool flagMember(JsonObject* object, const char* name) {
 JsonArray* arrayMember(JsonObject* object, const char* name) {
   JsonNode* node = json_object_get_member(object, name);
   return node && JSON_NODE_HOLDS_ARRAY(node) ? json_node_get_array(node) : nullptr;
+}
+
+JsonObject* objectMember(JsonObject* object, const char* name) {
+  JsonNode* node = json_object_get_member(object, name);
+  return node && JSON_NODE_HOLDS_OBJECT(node) ? json_node_get_object(node) : nullptr;
+}
+
+std::string writeJson(JsonNode* root) {
+  const OwnedText text(json_to_string(root, FALSE));
+  return text.get();
 }
 
 JsonWriter::JsonWriter() : _builder(json_builder_new_immutable()) {}
@@ -121,8 +131,7 @@ JsonWriter& JsonWriter::item(const std::string& value) {
 
 std::string JsonWriter::str() const {
   const JsonTree root(json_builder_get_root(get()));
-  const Text text(json_to_string(root.get(), FALSE));
-  return text.get();
+  return writeJson(root.get());
 }
 
-}  // namespace service
+}  // namespace common

@@ -6,7 +6,7 @@
 
 #include <memory>
 
-namespace base {
+namespace common {
 
 template <auto Release>
 struct ReleaseWith {
@@ -19,12 +19,22 @@ struct ReleaseWith {
 template <typename T, auto Release>
 using Owned = std::unique_ptr<T, ReleaseWith<Release>>;
 
+/// One reference to a GObject.
+template <typename T>
+using OwnedObject = Owned<T, g_object_unref>;
+
 using OwnedText = Owned<char, g_free>;
 using OwnedTexts = Owned<char*, g_strfreev>;
 using OwnedError = Owned<GError, g_error_free>;
+using OwnedBytes = Owned<GBytes, g_bytes_unref>;
 using OwnedVariant = Owned<GVariant, g_variant_unref>;
-using OwnedBus = Owned<GDBusConnection, g_object_unref>;
-using OwnedMessage = Owned<GDBusMessage, g_object_unref>;
+using OwnedBus = OwnedObject<GDBusConnection>;
+using OwnedMessage = OwnedObject<GDBusMessage>;
+
+template <typename T>
+OwnedObject<T> refer(T* object) {
+  return OwnedObject<T>(static_cast<T*>(g_object_ref(object)));
+}
 
 /// For C functions that answer through an out-parameter: `get(handle, Out(text))`.
 template <typename Owner>
@@ -41,4 +51,4 @@ class Out {
   typename Owner::pointer _handle = nullptr;
 };
 
-}  // namespace base
+}  // namespace common

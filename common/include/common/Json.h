@@ -1,6 +1,7 @@
 /// JSON of strangers in, JSON of ours out.
 #pragma once
 
+#include <common/Owned.h>
 #include <json-glib/json-glib.h>
 
 #include <cstdint>
@@ -8,9 +9,7 @@
 #include <string>
 #include <string_view>
 
-#include "Owned.h"
-
-namespace service {
+namespace common {
 
 using JsonTree = Owned<JsonNode, json_node_unref>;
 
@@ -22,6 +21,9 @@ std::optional<std::string> textMember(JsonObject* object, const char* name);
 std::optional<std::int64_t> numberMember(JsonObject* object, const char* name);
 bool flagMember(JsonObject* object, const char* name);
 JsonArray* arrayMember(JsonObject* object, const char* name);
+JsonObject* objectMember(JsonObject* object, const char* name);
+
+std::string writeJson(JsonNode* root);
 
 class JsonWriter {
  public:
@@ -40,7 +42,7 @@ class JsonWriter {
 
  private:
   JsonBuilder* get() const { return _builder.get(); }
-  Ref<JsonBuilder> _builder;
+  OwnedObject<JsonBuilder> _builder;
 };
 
-}  // namespace service
+}  // namespace common

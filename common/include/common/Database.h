@@ -1,0 +1,94 @@
+/// SQLite files in WAL mode that several processes share.
+#pragma once
+
+#include <common/Owned.h>
+#include <sqlite3.h>
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+
+namespace common {
+
+/// One execution of a prepared statement, reset when the use of it ends: bind in order, then step
+/// or run.
+class Statement {
+ public:
+  explicit Statement(sqlite3_stmt* statement) : _statement(statement) {}
+  Statement(const Statement&) = delete;
+  Statement& operator=(const Statement&) = delete;
+  ~Statement();
+
+  Statement& bind(const std::string& text);
+  Statement& bind(std::int64_t number);
+  /// Nothing is bound as null.
+  Statement& bind(const std::optional<std::string>& text);
+  Statement& bind(const std::optional<std::int64_t>& number);
+
+  /// True while there is a row.
+  bool step();
+  /// Whether step() ended for another reason than having no more rows.
+  bool failed() const { return _failed; }
+  /// Runs a statement without rows; false when it failed.
+  bool run();
+
+  /// Columns of the current row; null gives an empty text, or 0.
+  std::string text(int column) const;
+  std::int64_t number(int column) const;
+  std::optional<std::string> optionalText(int column) const;
+  std::optional<std::int64_t> optionalNumber(int column) const;
+
+ private:
+  sqlite3_stmt* _statement;
+  int _next = 1;
+  bool _failed = false;
+};
+
+class Database {
+ public:
+  /// Opens or creates the file and runs `schema`, which must be harmless on an existing database.
+  /// Null, with a line on the log, when that fails.
+  static std::unique_ptr<Database> open(const std::string& path, const char* schema);
+  Database(const Database&) = delete;
+  Database& operator=(const Database&) = delete;
+
+  /// Prepared at its first use and kept. `sql` outlives the database and is in use by at most one
+  /// Statement at a time.
+  Statement prepare(const char* sql);
+  bool execute(const char* sql);
+  std::int64_t lastRowId() const { return sqlite3_last_insert_rowid(_handle.get()); }
+  /// Rows that the last statement changed.
+  int changes() const { return sqlite3_changes(_handle.get()); }
+
+ private:
+  explicit Database(sqlite3* handle) : _handle(handle) {}
+  bool configure(const char* schema);
+
+  Owned<sqlite3, sqlite3_close_v2> _handle;
+  std::unordered_map<std::string_view, Owned<sqlite3_stmt, sqlite3_finalize>> _statements;
+};
+
+/// Rolled back unless committed.
+class Transaction {
+ public:
+  explicit Transaction(Database& database)
+      : _database(database), _open(database.execute("BEGIN IMMEDIATE")) {}
+  Transaction(const Transaction&) = delete;
+  Transaction& operator=(const Transaction&) = delete;
+  ~Transaction() {
+    if (_open) _database.execute("ROLLBACK");
+  }
+  bool commit() {
+    _open = !_database.execute("COMMIT");
+    return !_open;
+  }
+
+ private:
+  Database& _database;
+  bool _open;
+};
+
+}  // namespace common

@@ -1,0 +1,127 @@
+#include <common/Database.h>
+
+namespace common {
+namespace {
+
+constexpr int kBusyTimeoutMs = 3000;
+constexpr int kWalTries = 200;
+constexpr gulong kWalPauseUs = 5000;
+
+void logFailure(sqlite3* handle, const char* what) {
+  g_warning("database: %s: %s", what, handle ? sqlite3_errmsg(handle) : "out of memory");
+}
+
+// Two processes that create the file together: the switch to WAL fails as "locked" at once and
+// ignores the busy timeout.
+bool switchToWal(sqlite3* handle) {
+  for (int i = 0; i < kWalTries; i++) {
+    const int result = sqlite3_exec(handle, "PRAGMA journal_mode=WAL", nullptr, nullptr, nullptr);
+    if (result != SQLITE_BUSY) return result == SQLITE_OK;
+    g_usleep(kWalPauseUs);
+  }
+  return false;
+}
+
+}  // namespace
+
+Statement::~Statement() {
+  if (!_statement) return;
+  sqlite3_reset(_statement);
+  sqlite3_clear_bindings(_statement);
+}
+
+Statement& Statement::bind(const std::string& text) {
+  if (_statement) {
+    sqlite3_bind_text(_statement, _next++, text.data(), static_cast<int>(text.size()),
+                      SQLITE_TRANSIENT);
+  }
+  return *this;
+}
+
+Statement& Statement::bind(std::int64_t number) {
+  if (_statement) sqlite3_bind_int64(_statement, _next++, number);
+  return *this;
+}
+
+Statement& Statement::bind(const std::optional<std::string>& text) {
+  if (text) return bind(*text);
+  _next++;
+  return *this;
+}
+
+Statement& Statement::bind(const std::optional<std::int64_t>& number) {
+  if (number) return bind(*number);
+  _next++;
+  return *this;
+}
+
+bool Statement::step() {
+  const int result = _statement ? sqlite3_step(_statement) : SQLITE_MISUSE;
+  _failed = result != SQLITE_ROW && result != SQLITE_DONE;
+  if (_failed && _statement) logFailure(sqlite3_db_handle(_statement), "reading failed");
+  return result == SQLITE_ROW;
+}
+
+bool Statement::run() {
+  if (!_statement) return false;
+  if (sqlite3_step(_statement) == SQLITE_DONE) return true;
+  logFailure(sqlite3_db_handle(_statement), "writing failed");
+  return false;
+}
+
+std::string Statement::text(int column) const {
+  return optionalText(column).value_or(std::string());
+}
+
+std::int64_t Statement::number(int column) const {
+  return sqlite3_column_int64(_statement, column);
+}
+
+std::optional<std::string> Statement::optionalText(int column) const {
+  const auto* bytes = sqlite3_column_text(_statement, column);
+  if (!bytes) return std::nullopt;
+  return std::string(reinterpret_cast<const char*>(bytes),
+                     static_cast<std::size_t>(sqlite3_column_bytes(_statement, column)));
+}
+
+std::optional<std::int64_t> Statement::optionalNumber(int column) const {
+  if (sqlite3_column_type(_statement, column) == SQLITE_NULL) return std::nullopt;
+  return number(column);
+}
+
+std::unique_ptr<Database> Database::open(const std::string& path, const char* schema) {
+  sqlite3* handle = nullptr;
+  const int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE;
+  const bool opened = sqlite3_open_v2(path.c_str(), &handle, flags, nullptr) == SQLITE_OK;
+  std::unique_ptr<Database> database(new Database(handle));
+  if (opened && database->configure(schema)) return database;
+  logFailure(handle, ("cannot open " + path).c_str());
+  return nullptr;
+}
+
+bool Database::configure(const char* schema) {
+  sqlite3_busy_timeout(_handle.get(), kBusyTimeoutMs);
+  return switchToWal(_handle.get()) && execute("PRAGMA synchronous=NORMAL") &&
+         execute("PRAGMA foreign_keys=ON") && execute(schema);
+}
+
+Statement Database::prepare(const char* sql) {
+  auto& statement = _statements[sql];
+  if (!statement) {
+    sqlite3_stmt* prepared = nullptr;
+    if (sqlite3_prepare_v3(_handle.get(), sql, -1, SQLITE_PREPARE_PERSISTENT, &prepared, nullptr) !=
+        SQLITE_OK) {
+      logFailure(_handle.get(), sql);
+    }
+    statement.reset(prepared);
+  }
+  return Statement(statement.get());
+}
+
+bool Database::execute(const char* sql) {
+  if (sqlite3_exec(_handle.get(), sql, nullptr, nullptr, nullptr) == SQLITE_OK) return true;
+  logFailure(_handle.get(), sql);
+  return false;
+}
+
+}  // namespace common
