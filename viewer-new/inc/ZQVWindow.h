@@ -5,6 +5,7 @@
 #include <string>
 
 #include "ZQVAccess.h"
+#include "ZQVText.h"
 
 /// The window that shows a view; null once the view has left it.
 inline Evas_Object* zqvWindowOf(const app_assist::WViewController& view) {
@@ -16,4 +17,14 @@ inline Evas_Object* zqvWindowOf(const app_assist::WViewController& view) {
 /// the layout around the view object.
 inline void zqvNamePage(const app_assist::WViewController& view, const std::string& title) {
   zqvSetAccessibleName(elm_object_parent_widget_get(view.getEvasObj()), title);
+}
+
+/// The arrow in front of a page's title; the naviframe becomes its owner with the push.
+inline Evas_Object* zqvAddBackButton(Evas_Object* naviframe, Evas_Smart_Cb clicked,
+                                     const void* data) {
+  Evas_Object* back = elm_button_add(naviframe);
+  elm_object_style_set(back, "naviframe/end_btn/default");
+  evas_object_smart_callback_add(back, "clicked", clicked, data);
+  zqvSetAccessibleName(back, zqvText("Back"));
+  return back;
 }

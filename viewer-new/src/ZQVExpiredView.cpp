@@ -11,6 +11,7 @@
 #include "ZQVMarkup.h"
 #include "ZQVOwned.h"
 #include "ZQVText.h"
+#include "ZQVWindow.h"
 
 namespace {
 
@@ -62,10 +63,7 @@ Evas_Object* ZQVExpiredView::onCreateView(Evas_Object* parent, void*) {
 }
 
 Elm_Object_Item* ZQVExpiredView::onPushToNaviframe(Evas_Object* naviframe) {
-  Evas_Object* back = elm_button_add(naviframe);
-  elm_object_style_set(back, "naviframe/end_btn/default");
-  evas_object_smart_callback_add(back, "clicked", _backTitleButtonPressedCb, this);
-  zqvSetAccessibleName(back, zqvText("Back"));
+  Evas_Object* back = zqvAddBackButton(naviframe, _backTitleButtonPressedCb, this);
   return elm_naviframe_item_push(naviframe, getTitle(), back, nullptr, getEvasObj(), nullptr);
 }
 

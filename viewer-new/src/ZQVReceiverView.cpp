@@ -14,6 +14,7 @@
 #include "ZQVStatusMessage.h"
 #include "ZQVText.h"
 #include "ZQVThumbItem.h"
+#include "ZQVWindow.h"
 
 namespace {
 
@@ -84,10 +85,7 @@ void ZQVReceiverView::onCreated() {
 }
 
 Elm_Object_Item* ZQVReceiverView::onPushToNaviframe(Evas_Object* naviframe) {
-  Evas_Object* back = elm_button_add(naviframe);
-  elm_object_style_set(back, "naviframe/end_btn/default");
-  evas_object_smart_callback_add(back, "clicked", _backButtonCb, this);
-  zqvSetAccessibleName(back, zqvText("Back"));
+  Evas_Object* back = zqvAddBackButton(naviframe, _backButtonCb, this);
   return elm_naviframe_item_push(naviframe, getTitle(), back, nullptr, getEvasObj(), nullptr);
 }
 

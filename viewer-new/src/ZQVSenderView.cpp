@@ -121,10 +121,7 @@ void ZQVSenderView::onCreated() {
 }
 
 Elm_Object_Item* ZQVSenderView::onPushToNaviframe(Evas_Object* naviframe) {
-  Evas_Object* back = elm_button_add(naviframe);
-  elm_object_style_set(back, "naviframe/end_btn/default");
-  evas_object_smart_callback_add(back, "clicked", exitCb, nullptr);
-  zqvSetAccessibleName(back, zqvText("Back"));
+  Evas_Object* back = zqvAddBackButton(naviframe, exitCb, nullptr);
   return elm_naviframe_item_push(naviframe, getTitle(), back, nullptr, getEvasObj(), nullptr);
 }
 
