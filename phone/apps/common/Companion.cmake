@@ -11,9 +11,7 @@ function(companion_application target id)
       COMMAND ${CMAKE_COMMAND} -E make_directory ${folder}
       COMMAND ${CMAKE_COMMAND} -E rm -f ${folder}/companion.edj
       COMMAND ${CMAKE_COMMAND} -E copy ${COMPANION_THEME} ${folder})
-    if(IS_DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR}/res)
-      phone_image(res DESTINATION apps/${id}/res)
-    endif()
+    catalogue(${id} apps/${id}/res/locale po/LANGUAGE.po ../common/po/LANGUAGE.po)
   endif()
 endfunction()
 

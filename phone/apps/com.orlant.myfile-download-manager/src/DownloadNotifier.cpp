@@ -1,5 +1,7 @@
 #include "DownloadNotifier.h"
 
+#include <companion/Text.h>
+
 #include <memory>
 
 namespace downloads {
@@ -27,10 +29,10 @@ void DownloadNotifier::post(const std::string& message, std::function<void()> on
   GVariantBuilder actions;
   g_variant_builder_init(&actions, G_VARIANT_TYPE_STRING_ARRAY);
   g_variant_builder_add(&actions, "s", "default");
-  g_variant_builder_add(&actions, "s", "Open");
+  g_variant_builder_add(&actions, "s", companion::text("Open"));
   g_dbus_connection_call(_bus.get(), kService, kPath, kService, "Notify",
-                         g_variant_new("(susssasa{sv}i)", "Downloads", 0u, "", "", body.get(),
-                                       &actions, nullptr, kShownMs),
+                         g_variant_new("(susssasa{sv}i)", companion::text("Downloads"), 0u, "", "",
+                                       body.get(), &actions, nullptr, kShownMs),
                          G_VARIANT_TYPE("(u)"), G_DBUS_CALL_FLAGS_NONE, -1, nullptr, _postedCb,
                          new Posted{this, std::move(onTap)});
 }

@@ -41,17 +41,20 @@ std::string titleOf(const Download& download) {
 }  // namespace
 
 DownloadPage::DownloadPage(DownloadManager& manager, GoneHandler onGone)
-    : _manager(manager), _onGone(std::move(onGone)) {
-  setTitle(text("Downloads"));
-}
+    : _manager(manager), _onGone(std::move(onGone)) {}
 
 DownloadPage::~DownloadPage() {
   if (_timer) ecore_timer_del(_timer);
   _onGone();
 }
 
-void DownloadPage::onCreated() {
+void DownloadPage::showTexts() {
+  setTitle(text("Downloads"));
   setEmptyText(text("Nothing has been downloaded yet"));
+  _refreshHeader();
+}
+
+void DownloadPage::onCreated() {
   listChanged();
 }
 
@@ -98,8 +101,7 @@ void DownloadPage::_refreshHeader() {
     return;
   }
   _meter.sample(total.received, ecore_time_get());
-  std::string summary =
-      total.files == 1 ? std::string(text("1 file")) : companion::format("%d files", total.files);
+  std::string summary = companion::filesText(total.files);
   summary += ", " + companion::format("%s of %s", companion::sizeText(total.received).c_str(),
                                       companion::sizeText(total.size).c_str());
   const std::string left = timeLeftText(_meter.secondsFor(total.size - total.received));

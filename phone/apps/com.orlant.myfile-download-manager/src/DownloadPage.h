@@ -28,6 +28,7 @@ class DownloadPage : public companion::ListPage {
   void listChanged();
 
  protected:
+  void showTexts() override;
   companion::Row row(companion::RowKey key) override;
   std::vector<Button> buttons() override;
 

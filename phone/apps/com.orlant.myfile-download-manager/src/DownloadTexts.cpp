@@ -42,7 +42,7 @@ std::string progressText(const Download& download) {
 
 std::string waitingText(const Download& download, bool isHeldBack) {
   if (!isHeldBack) return text("Waiting");
-  return text(download.wifiOnly ? "Waiting for Wi-Fi" : "Waiting for a network");
+  return download.wifiOnly ? text("Waiting for Wi-Fi") : text("Waiting for a network");
 }
 
 }  // namespace

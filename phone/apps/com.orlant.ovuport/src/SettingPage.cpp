@@ -8,12 +8,14 @@ using companion::text;
 
 namespace ovuport {
 
-SettingPage::SettingPage(Subscriber& subscriber) : _subscriber(subscriber) {
+SettingPage::SettingPage(Subscriber& subscriber) : _subscriber(subscriber) {}
+
+void SettingPage::showTexts() {
   setTitle(text("Account"));
+  setHeader(companion::format("Signed up as %s", _subscriber.number.c_str()));
 }
 
 void SettingPage::onCreated() {
-  setHeader(companion::format("Signed up as %s", _subscriber.number.c_str()));
   setRows({0});
 }
 
@@ -21,7 +23,7 @@ companion::Row SettingPage::row(companion::RowKey) {
   companion::Row row;
   const bool on = _subscriber.accounts.isServiceOn(OVU_SERVICE_SHARE);
   row.title = text("Sharing service");
-  row.detail = text(_isSwitching ? "Switching…" : on ? "On" : "Off");
+  row.detail = _isSwitching ? text("Switching…") : on ? text("On") : text("Off");
   row.checked = on;
   return row;
 }

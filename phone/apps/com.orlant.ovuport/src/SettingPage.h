@@ -15,6 +15,7 @@ class SettingPage : public companion::ListPage {
   void onCreated() override;
 
  protected:
+  void showTexts() override;
   companion::Row row(companion::RowKey key) override;
   void onRowTapped(companion::RowKey key) override;
 

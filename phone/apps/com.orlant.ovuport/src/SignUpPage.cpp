@@ -9,13 +9,28 @@ using companion::text;
 namespace ovuport {
 
 SignUpPage::SignUpPage(Subscriber& subscriber, std::string server)
-    : _subscriber(subscriber), _server(std::move(server)) {
+    : _subscriber(subscriber), _server(std::move(server)) {}
+
+void SignUpPage::showTexts() {
   setTitle(text("Sign up"));
+  switch (_step) {
+    case Step::Asking:
+      return setHeader(text("To share files, sign up with the number of this phone."));
+    case Step::SigningUp:
+      return setHeader(text("Signing up…"));
+    case Step::Failed:
+      return setHeader(text("Signing up did not work. Try again."));
+  }
 }
 
 void SignUpPage::onCreated() {
-  setHeader(text("To share files, sign up with the number of this phone."));
   setRows({0});
+}
+
+void SignUpPage::_goTo(Step step) {
+  _step = step;
+  setButtonEnabled(0, step != Step::SigningUp);
+  showTexts();
 }
 
 void SignUpPage::onPushed(Elm_Object_Item* item) {
@@ -36,8 +51,7 @@ std::vector<companion::ListPage::Button> SignUpPage::buttons() {
 }
 
 void SignUpPage::_signUp() {
-  setButtonEnabled(0, false);
-  setHeader(text("Signing up…"));
+  _goTo(Step::SigningUp);
   const std::string imsi = ovu::simCardImsi();
   _subscriber.service.signUp(imsi, [this, imsi](int error) { _signedUp(imsi, error); });
 }
@@ -46,8 +60,7 @@ void SignUpPage::_signedUp(const std::string& imsi, int error) {
   const bool succeeded =
       error == ZELQO_ERROR_NONE && _subscriber.accounts.signUp(_subscriber.number, imsi);
   if (!succeeded) {
-    setButtonEnabled(0, true);
-    setHeader(text("Signing up did not work. Try again."));
+    _goTo(Step::Failed);
     return;
   }
   companion::showMessage(text("Signed up"));

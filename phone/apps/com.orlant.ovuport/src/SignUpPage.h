@@ -17,15 +17,20 @@ class SignUpPage : public companion::ListPage {
   void onPushed(Elm_Object_Item* item) override;
 
  protected:
+  void showTexts() override;
   companion::Row row(companion::RowKey key) override;
   std::vector<Button> buttons() override;
 
  private:
+  enum class Step { Asking, SigningUp, Failed };
+
+  void _goTo(Step step);
   void _signUp();
   void _signedUp(const std::string& imsi, int error);
 
   Subscriber& _subscriber;
   std::string _server;
+  Step _step = Step::Asking;
 };
 
 }  // namespace ovuport

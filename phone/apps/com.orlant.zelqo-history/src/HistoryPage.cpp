@@ -22,12 +22,14 @@ std::int64_t nowMs() {
 
 }  // namespace
 
-HistoryPage::HistoryPage() : _contacts([this] { updateRows(); }), _watch([this] { reload(); }) {
+HistoryPage::HistoryPage() : _contacts([this] { updateRows(); }), _watch([this] { reload(); }) {}
+
+void HistoryPage::showTexts() {
   setTitle(text("Sharing history"));
+  setEmptyText(text("Nothing has been shared yet"));
 }
 
 void HistoryPage::onCreated() {
-  setEmptyText(text("Nothing has been shared yet"));
   reload();
 }
 

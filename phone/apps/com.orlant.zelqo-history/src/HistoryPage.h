@@ -22,6 +22,7 @@ class HistoryPage : public companion::ListPage {
   void reload();
 
  protected:
+  void showTexts() override;
   companion::Row row(companion::RowKey key) override;
   void onRowTapped(companion::RowKey key) override;
   std::vector<Button> buttons() override;

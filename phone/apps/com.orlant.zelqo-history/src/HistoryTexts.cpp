@@ -18,10 +18,9 @@ std::string dateText(std::int64_t ms) {
 }
 
 std::string filesText(const zelqo::ShareSummary& share) {
-  if (share.fileCount != 1) {
-    return format("%d files", static_cast<int>(share.fileCount));
+  if (share.fileCount != 1 || share.firstFile.empty()) {
+    return companion::filesText(static_cast<int>(share.fileCount));
   }
-  if (share.firstFile.empty()) return text("1 file");
   const common::OwnedText name(g_path_get_basename(share.firstFile.c_str()));
   return name.get();
 }
@@ -31,8 +30,9 @@ std::string stateText(const zelqo::ShareSummary& share, std::int64_t nowMs) {
   if (share.expiresMs / 1000 < nowMs / 1000) {
     return format("Expired on %s", dateText(share.expiresMs).c_str());
   }
-  return format(share.received ? "Received on %s" : "Sent on %s",
-                dateText(share.createdMs).c_str());
+  const std::string date = dateText(share.createdMs);
+  return share.received ? format("Received on %s", date.c_str())
+                        : format("Sent on %s", date.c_str());
 }
 
 }  // namespace

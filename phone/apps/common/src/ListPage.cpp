@@ -33,25 +33,36 @@ Evas_Object* ListPage::onCreateView(Evas_Object* parent, void*) {
   elm_object_part_content_set(_layout, "list", _list->object());
   _progress = makeProgress(_layout, 0);
   elm_object_part_content_set(_layout, "progress", _progress);
+  evas_object_smart_callback_add(_layout, "language,changed", _languageChangedCb, this);
+  showTexts();
   return _layout;
 }
 
 Evas_Object* ListPage::onViewDeleted(Evas_Object* view) {
   _layout = nullptr;
+  _back = nullptr;
   _progress = nullptr;
   _buttons.clear();
   return view;
 }
 
+void ListPage::_languageChangedCb(void* data, Evas_Object*, void*) {
+  auto* page = static_cast<ListPage*>(data);
+  page->showTexts();
+  setAccessibleName(page->_back, text("Back"));
+  std::size_t i = 0;
+  for (const auto& button : page->buttons()) setLabel(page->_buttons[i++], button.label);
+  page->updateRows();
+}
+
 Elm_Object_Item* ListPage::onPushToNaviframe(Evas_Object* naviframe) {
-  Evas_Object* back = nullptr;
   if (hasBackButton()) {
-    back = makeButton(
+    _back = makeButton(
         naviframe, "naviframe/end_btn/default", "", [this] { getNaviframe()->pop(); },
         text("Back"));
   }
-  return elm_naviframe_item_push(naviframe, escape(getTitle()).c_str(), back, nullptr, getEvasObj(),
-                                 getItemStyle());
+  return elm_naviframe_item_push(naviframe, escape(getTitle()).c_str(), _back, nullptr,
+                                 getEvasObj(), getItemStyle());
 }
 
 void ListPage::onPushed(Elm_Object_Item* item) {
@@ -83,7 +94,9 @@ void ListPage::_show(const char* part, bool shown) {
 void ListPage::setRows(const std::vector<RowKey>& keys) {
   if (!_layout) return;
   _list->setRows(keys);
-  _show("empty", keys.empty());
+  _isEmpty = keys.empty();
+  _show("empty", _isEmpty);
+  _describe();
 }
 
 void ListPage::updateRow(RowKey key) {
@@ -96,15 +109,25 @@ void ListPage::updateRows() {
 
 void ListPage::setHeader(const std::string& summary, std::optional<double> progress) {
   if (!_layout) return;
+  _summary = summary;
   elm_layout_text_set(_layout, "header", escape(summary).c_str());
   _show("header", !summary.empty());
   _show("progress", progress.has_value());
   elm_progressbar_value_set(_progress, progress.value_or(0));
-  setAccessibleName(_progress, std::string(text("Progress")) + " " + summary);
+  setAccessibleName(_progress, format("Progress: %s", summary.c_str()));
+  _describe();
 }
 
 void ListPage::setEmptyText(const std::string& emptyText) {
-  if (_layout) elm_layout_text_set(_layout, "empty", escape(emptyText).c_str());
+  if (!_layout) return;
+  _emptyText = emptyText;
+  elm_layout_text_set(_layout, "empty", escape(emptyText).c_str());
+  _describe();
+}
+
+// Screen readers see widgets only, and these texts are none.
+void ListPage::_describe() {
+  setAccessibleName(_layout, _summary.empty() && _isEmpty ? _emptyText : _summary);
 }
 
 void ListPage::setButtonEnabled(std::size_t index, bool enabled) {

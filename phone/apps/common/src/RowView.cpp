@@ -21,7 +21,7 @@ RowView::RowView(Evas_Object* list, const Row& row) : _layout(elm_layout_add(lis
   if (row.checked) _put("end", makeCheck(_layout, *row.checked, row.title));
   if (row.progress) {
     _progress = makeProgress(_layout, *row.progress);
-    setAccessibleName(_progress, std::string(text("Progress")) + " " + row.title);
+    setAccessibleName(_progress, format("Progress: %s", row.title.c_str()));
     _put("progress", _progress);
   }
   if (!row.actions.empty()) _put("actions", _makeActions(row));

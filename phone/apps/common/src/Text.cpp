@@ -32,11 +32,17 @@ std::string format(const char* id, ...) {
   return line ? line.get() : "";
 }
 
+std::string filesText(int count) {
+  return count == 1 ? text("1 file") : format("%d files", count);
+}
+
 std::string sizeText(unsigned long long bytes) {
-  if (bytes < kKilobyte) return format("%llu B", bytes);
-  const auto size = static_cast<double>(bytes);
-  if (bytes < kMegabyte) return format("%.1f KB", size / kKilobyte);
-  return format("%.1f MB", size / kMegabyte);
+  const bool isBig = bytes >= kMegabyte;
+  const double size = static_cast<double>(bytes) / (isBig ? kMegabyte : kKilobyte);
+  const common::OwnedText line(bytes < kKilobyte
+                                 ? g_strdup_printf("%llu B", bytes)
+                                 : g_strdup_printf("%.1f %s", size, isBig ? "MB" : "KB"));
+  return line.get();
 }
 
 std::string escape(const std::string& plain) {

@@ -26,13 +26,18 @@ Evas_Object* makeButton(Evas_Object* parent, const char* style, const std::strin
                         Handler onClick, const std::string& name) {
   Evas_Object* button = elm_button_add(parent);
   elm_object_style_set(button, style);
-  elm_object_text_set(button, escape(label).c_str());
-  setAccessibleName(button, name.empty() ? label : name);
+  setLabel(button, label);
+  if (!name.empty()) setAccessibleName(button, name);
   auto* handler = new Handler(std::move(onClick));
   evas_object_smart_callback_add(button, "clicked", clickedCb, handler);
   evas_object_event_callback_add(button, EVAS_CALLBACK_DEL, deletedCb, handler);
   evas_object_show(button);
   return button;
+}
+
+void setLabel(Evas_Object* button, const std::string& label) {
+  elm_object_text_set(button, escape(label).c_str());
+  setAccessibleName(button, label);
 }
 
 // Shows only: the row that holds it is what one taps.

@@ -15,12 +15,14 @@ PickerPage::PickerPage(const PickerRequest& request, companion::PendingReply rep
     : _request(request),
       _reply(std::move(reply)),
       _uploader(_store),
-      _contacts([this] { _reload(); }) {
-  setTitle(text("Select recipients"));
+      _contacts([this] { _reload(); }) {}
+
+void PickerPage::showTexts() {
+  setEmptyText(text("There is nobody in the address book"));
+  _showSelection();
 }
 
 void PickerPage::onCreated() {
-  setEmptyText(text("There is nobody in the address book"));
   _reload();
 }
 

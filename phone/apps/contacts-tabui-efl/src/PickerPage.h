@@ -24,6 +24,7 @@ class PickerPage : public companion::ListPage {
   void onPushed(Elm_Object_Item* item) override;
 
  protected:
+  void showTexts() override;
   companion::Row row(companion::RowKey key) override;
   void onRowTapped(companion::RowKey key) override;
   std::vector<Button> buttons() override;

@@ -30,10 +30,13 @@ class ListPage : public app_assist::WContentViewController {
     std::function<void()> run;
   };
 
+  /// Sets the page's own texts: title, summary, what stands instead of an empty list. Asked for
+  /// when the page is made and whenever the language changes.
+  virtual void showTexts() = 0;
   /// What the row shows now.
   virtual Row row(RowKey key) = 0;
   virtual void onRowTapped(RowKey key);
-  /// The buttons along the bottom, left to right; asked for once.
+  /// The buttons along the bottom, left to right; always the same but for the language.
   virtual std::vector<Button> buttons();
   /// A start page has nothing to go back to.
   virtual bool hasBackButton() const { return true; }
@@ -48,11 +51,17 @@ class ListPage : public app_assist::WContentViewController {
   void setButtonEnabled(std::size_t index, bool enabled);
 
  private:
+  static void _languageChangedCb(void* data, Evas_Object* layout, void* info);
   void _show(const char* part, bool shown);
+  void _describe();
 
   Evas_Object* _layout = nullptr;
+  Evas_Object* _back = nullptr;
   Evas_Object* _progress = nullptr;
   std::vector<Evas_Object*> _buttons;
+  std::string _summary;
+  std::string _emptyText;
+  bool _isEmpty = false;
   std::unique_ptr<ListView> _list;
 };
 

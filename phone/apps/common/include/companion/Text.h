@@ -12,7 +12,10 @@ const char* text(const char* id);
 /// printf over text(id): only for arguments that fit the id.
 std::string format(const char* id, ...) __attribute__((format(printf, 1, 2)));
 
-/// "12.3 MB".
+/// "3 files".
+std::string filesText(int count);
+
+/// "12.3 MB": the same in all languages, as in the viewer.
 std::string sizeText(unsigned long long bytes);
 
 /// Text from elsewhere as markup that shows it as it stands.
