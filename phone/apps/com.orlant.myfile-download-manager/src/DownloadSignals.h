@@ -14,8 +14,7 @@ class DownloadSignals {
 
   void downloading(const std::string& url) { _emit("file_downloading", url); }
   void downloaded(const std::string& url) { _emit("file_downloaded", url); }
-  /// Failed or cancelled: it can be asked for again. Who follows only the other two learns it when
-  /// it next looks for the file, and from the next "file_downloading" after a retry in the list.
+  /// Failed or cancelled: it can be asked for again.
   void failed(const std::string& url) { _emit("file_failed", url); }
 
  private:
