@@ -13,6 +13,7 @@
 #include "ZQVLog.h"
 #include "ZQVOrlantLog.h"
 #include "ZQVOwned.h"
+#include "ZQVPager.h"
 #include "ZQVStatusMessage.h"
 #include "ZQVText.h"
 #include "ZQVUnableOpenFilePopup.h"
@@ -160,6 +161,7 @@ void ZQVFullView::update(int event) {
   elm_object_domain_translatable_text_set(button, ZQV_TEXT_DOMAIN, isOpen ? kOpen : kDownload);
   if (_unablePopup) _unablePopup->update(event);
   if (_wifiPopup) _wifiPopup->update(event);
+  _fitPages();  // they may run the other way now
 }
 
 void ZQVFullView::_realizedCb(void* data, Evas_Object* pager, void*) {
@@ -182,8 +184,9 @@ void ZQVFullView::_scrollCb(void* data, Evas_Object* pager, void*) {
   auto* view = static_cast<ZQVFullView*>(data);
   // While the pages are being fitted the pager drifts; the page on screen stays the current one.
   if (view->_delayer.isRunning()) return;
-  int page = 0;
-  elm_scroller_current_page_get(pager, &page, nullptr);
+  // Nor is it another page that pages now run the other way; update() fits them anew.
+  if (view->_isMirrored != elm_config_mirrored_get()) return;
+  const int page = zqvPageOnScreen(pager);
   if (page == view->_currentPage) return;
   view->_currentPage = page;
   view->_curItem = view->_itemOfPage(page);
@@ -233,7 +236,7 @@ bool ZQVFullView::_delayerSetSize(void* data) {
   auto* view = static_cast<ZQVFullView*>(data);
   Evas_Object* pager = view->_grid.get();
   if (!pager) return false;
-  elm_scroller_page_show(pager, view->_currentPage, 0);
+  zqvShowPage(pager, view->_currentPage);
   Eina_Bool isVerticalSnap = EINA_FALSE;
   elm_scroller_page_snap_get(pager, nullptr, &isVerticalSnap);
   elm_scroller_page_snap_set(pager, EINA_TRUE, isVerticalSnap);
@@ -254,7 +257,6 @@ void ZQVFullView::_downloadRequest(ZQVFullView* view, ZQVWifiSelectPopup* popup)
 void ZQVFullView::_setUpPager() {
   Evas_Object* pager = _grid.get();
   evas_object_size_hint_weight_set(pager, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-  elm_gengrid_align_set(pager, 0.0, 0.0);
   elm_gengrid_horizontal_set(pager, EINA_TRUE);
   elm_gengrid_multi_select_set(pager, EINA_TRUE);
   elm_scroller_policy_set(pager, ELM_SCROLLER_POLICY_OFF, ELM_SCROLLER_POLICY_OFF);
@@ -278,13 +280,8 @@ void ZQVFullView::_resizedCb(void* data, Evas*, Evas_Object*, void*) {
 /// Makes every page as large as the pager, keeps the page on screen, and lets paging snap again
 /// once the layout has settled.
 void ZQVFullView::_fitPages() {
-  Evas_Object* pager = _grid.get();
-  int width = 0;
-  int height = 0;
-  evas_object_geometry_get(pager, nullptr, nullptr, &width, &height);
-  if (width <= 0 || height <= 0) return;
-  elm_gengrid_item_size_set(pager, width, height);
-  elm_scroller_page_size_set(pager, width, height);
+  if (!zqvFitPages(_grid.get())) return;
+  _isMirrored = elm_object_mirrored_get(_grid.get());
   _showCurrentPage();
   _delayer.start(kSettleTime, [this] { return _delayerSetSize(this); });
 }

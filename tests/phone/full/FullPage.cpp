@@ -62,6 +62,7 @@ void FullPage::TearDown() {
   thePhone()({"service", "ok"});
   thePhone()({"network", "wifi"});
   thePhone()({"rotate", "0"});
+  thePhone()({"language", "en_US.UTF-8"});
   thePhone().closeViewer();
   closePrograms();
   for (const auto& file : fs::directory_iterator(ofPhone("/opt/usr/media/Downloads"))) {
@@ -91,6 +92,11 @@ void openSent(const Words& files, const std::string& cell) {
 std::string pageOn(const Tree& tree) {
   const size_t number = pageNumberOn(tree);
   return number ? tree.items()[number - 1].name : "";
+}
+
+Area pageArea(const Tree& tree) {
+  const size_t number = pageNumberOn(tree);
+  return number ? tree.items()[number - 1].area : Area{};
 }
 
 testing::AssertionResult pageNumberIs(size_t number) {

@@ -24,6 +24,8 @@ void openSent(const phone::Words& files, const std::string& cell);
 
 /// The accessible name of the file whose page fills the pager; empty while none does.
 std::string pageOn(const phone::Tree& tree);
+/// Where that page is; nowhere while none fills the pager.
+phone::Area pageArea(const phone::Tree& tree);
 /// Waits until that file is the page and nothing moves any more.
 testing::AssertionResult pageIs(const std::string& name);
 

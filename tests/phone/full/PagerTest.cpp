@@ -26,6 +26,18 @@ std::string manifestOf(int files) {
   return path;
 }
 
+// Is the file the page, on a phone that lies or stands as it was turned?
+testing::AssertionResult fillsTheScreen(const std::string& name, const std::string& turn) {
+  const bool lies = turn != "0";
+  const auto fills = [&] {
+    const phone::Tree tree = thePhone().tree();
+    return pageOn(tree).rfind(name + ", ", 0) == 0 &&
+           (pageArea(tree).height == tree.widgets().front().area.height) == lies;
+  };
+  if (waitFor(fills)) return testing::AssertionSuccess();
+  return testing::AssertionFailure() << "not \"" << name << "\" on\n" << thePhone().tree();
+}
+
 }  // namespace
 
 TEST_F(Pager, ShowsTheFileThatWasTapped) {
@@ -81,12 +93,7 @@ TEST_F(Pager, StaysOnTheSeventhPageWhenThePhoneIsTurned) {
   for (const char* turn : {"90", "0", "270", "0"}) {
     SCOPED_TRACE(turn);
     thePhone()({"rotate", turn});
-    const bool lies = turn != std::string("0");
-    ASSERT_TRUE(waitFor([&] {
-      const phone::Tree tree = thePhone().tree();
-      return !tree.widgets().empty() && pageOn(tree).rfind(file(7) + ", ", 0) == 0 &&
-             (tree.items()[6].area.height == tree.widgets().front().area.height) == lies;
-    })) << thePhone().tree();
+    ASSERT_TRUE(fillsTheScreen(file(7), turn));
   }
 }
 
@@ -97,6 +104,29 @@ TEST_F(Pager, FollowsASwipeOnAPhoneThatLies) {
   thePhone()({"painted"});
   thePhone()({"swipe", "370,250", "370,1050", "250"});
   EXPECT_TRUE(pageIs(file(3)));
+}
+
+TEST_F(Pager, RunsFromRightToLeftInArabic) {
+  thePhone()({"language", "ar_EG.UTF-8"});
+  openReceived(numberedFiles(9), file(5));
+  swipeBack();
+  ASSERT_TRUE(pageIs(file(6)));
+  swipeForth();
+  ASSERT_TRUE(pageIs(file(5)));
+  swipeForth();
+  ASSERT_TRUE(pageIs(file(4)));
+  for (const char* turn : {"90", "0"}) {
+    SCOPED_TRACE(turn);
+    thePhone()({"rotate", turn});
+    EXPECT_TRUE(fillsTheScreen(file(4), turn));
+  }
+  swipeBack();
+  EXPECT_TRUE(pageIs(file(5)));
+  thePhone()({"language", "en_US.UTF-8"});
+  ASSERT_TRUE(buttonIsEnabled("Download"));
+  EXPECT_TRUE(pageIs(file(5)));
+  swipeForth();
+  EXPECT_TRUE(pageIs(file(6)));
 }
 
 TEST_F(Pager, FindsThePageAmongFiveThousand) {

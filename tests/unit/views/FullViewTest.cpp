@@ -34,6 +34,24 @@ void signalDownload(const char* member, const char* url) {
   g_object_unref(bus);
 }
 
+/// As in an Arabic or Hebrew interface, as long as it lives.
+class FromRightToLeft {
+ public:
+  FromRightToLeft() { elm_config_mirrored_set(EINA_TRUE); }
+  ~FromRightToLeft() { elm_config_mirrored_set(EINA_FALSE); }
+};
+
+bool isInTheMiddleOfItsGrid(Elm_Object_Item* cell) {
+  Evas_Object* object = elm_object_item_track(cell);
+  if (!object) return false;
+  int x = 0, width = 0, left = 0, all = 0;
+  evas_object_geometry_get(object, &x, nullptr, &width, nullptr);
+  elm_object_item_untrack(cell);
+  evas_object_geometry_get(elm_object_item_widget_get(cell), &left, nullptr, &all, nullptr);
+  const int middle = left + all / 2;
+  return x <= middle && middle < x + width;
+}
+
 }  // namespace
 
 /// Which files were in the middle of the pager in the frames that were painted.
@@ -54,18 +72,8 @@ class PaintedPages {
     auto* self = static_cast<PaintedPages*>(data);
     for (size_t i = 0; i < self->_items.size(); ++i) {
       Elm_Object_Item* cell = self->_items[i].gridItems[ZQV_VIEW_FULL_RECEIVER];
-      if (cell && isInTheMiddle(cell)) self->_pages.insert(static_cast<int>(i));
+      if (cell && isInTheMiddleOfItsGrid(cell)) self->_pages.insert(static_cast<int>(i));
     }
-  }
-  static bool isInTheMiddle(Elm_Object_Item* cell) {
-    Evas_Object* object = elm_object_item_track(cell);
-    if (!object) return false;
-    int x = 0, width = 0, left = 0, all = 0;
-    evas_object_geometry_get(object, &x, nullptr, &width, nullptr);
-    elm_object_item_untrack(cell);
-    evas_object_geometry_get(elm_object_item_widget_get(cell), &left, nullptr, &all, nullptr);
-    const int middle = left + all / 2;
-    return x <= middle && middle < x + width;
   }
 
   const Items& _items;
@@ -120,6 +128,12 @@ class FullView : public ViewTest {
   }
   bool waitForPage(int wanted) {
     return waitUntil([this, wanted] { return isSettled() && page() == wanted; });
+  }
+  /// In either direction: the page is found by what is on it.
+  bool waitForFile(int file) {
+    return waitUntil([this, file] {
+      return isSettled() && isInTheMiddleOfItsGrid(items[file].gridItems[ZQV_VIEW_FULL_RECEIVER]);
+    });
   }
   void turnTo(int wanted) {
     ASSERT_TRUE(waitUntil([this] { return isSettled(); }));
@@ -194,6 +208,49 @@ TEST_F(FullView, PaintsNoOtherPageFirst) {
   ASSERT_TRUE(waitForPage(6));
   painted.stop();
   EXPECT_THAT(painted.pages(), ElementsAre(6));
+}
+
+TEST_F(FullView, BeginsWithTheTappedFileFromRightToLeft) {
+  const FromRightToLeft mirrored;
+  items.addCount(9);
+  items[2].downloadStatus = ZQV_DOWNLOADED;
+  open(3);
+  ASSERT_TRUE(waitForFile(3));
+  EXPECT_EQ(buttonText(), zqvText(kDownload));
+  // A page to the right is the one before.
+  int x = 0, y = 0, width = 0, height = 0;
+  elm_scroller_region_get(pager, &x, &y, &width, &height);
+  elm_scroller_page_snap_set(pager, EINA_FALSE, EINA_FALSE);
+  elm_scroller_region_show(pager, x + width, y, width, height);
+  elm_scroller_page_snap_set(pager, EINA_TRUE, EINA_FALSE);
+  ASSERT_TRUE(waitForFile(2));
+  ZQVFullView::_scrollCb(view, pager, nullptr);
+  EXPECT_EQ(buttonText(), zqvText(kOpen));
+}
+
+TEST_F(FullView, KeepsItsPageInEveryShapeFromRightToLeft) {
+  const FromRightToLeft mirrored;
+  items.addCount(9);
+  open(2);
+  ASSERT_TRUE(waitForFile(2));
+  for (const int degrees : {90, 0}) {
+    elm_win_rotation_with_resize_set(TestApp::get().window(), degrees);
+    ASSERT_TRUE(waitUntil([this] { return !isSettled(); }));
+    EXPECT_TRUE(waitForFile(2));
+  }
+}
+
+TEST_F(FullView, KeepsItsPageWhenTheDirectionChanges) {
+  items.addCount(9);
+  open(6);
+  ASSERT_TRUE(waitForFile(6));
+  {
+    const FromRightToLeft mirrored;
+    view->update(kLanguageChanged);
+    EXPECT_TRUE(waitForFile(6));
+  }
+  view->update(kLanguageChanged);
+  EXPECT_TRUE(waitForFile(6));
 }
 
 TEST_F(FullView, MarksItsPagerWithItsKind) {
