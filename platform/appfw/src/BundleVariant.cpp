@@ -2,6 +2,8 @@
 
 #include <dlog.h>
 
+#include <unordered_set>
+
 namespace appfw {
 namespace {
 
@@ -12,15 +14,17 @@ GVariant* textsVariant(const keyval_t& entry) {
   return g_variant_builder_end(&texts);
 }
 
-bool add(bundle& target, const char* key, GVariant* value) {
-  if (!*key) return false;
+/// False when the value is no text and no text array.
+bool append(bundle& target, const char* key, GVariant* value) {
   if (g_variant_is_of_type(value, G_VARIANT_TYPE_STRING)) {
-    return target.add(key, std::string(g_variant_get_string(value, nullptr)));
+    target.entries.emplace_back(key, std::string(g_variant_get_string(value, nullptr)));
+    return true;
   }
   if (!g_variant_is_of_type(value, G_VARIANT_TYPE_STRING_ARRAY)) return false;
   gsize count = 0;
   common::Owned<const char*, g_free> texts(g_variant_get_strv(value, &count));
-  return target.add(key, std::vector<std::string>(texts.get(), texts.get() + count));
+  target.entries.emplace_back(key, std::vector<std::string>(texts.get(), texts.get() + count));
+  return true;
 }
 
 }  // namespace
@@ -43,15 +47,19 @@ GVariant* toVariant(const bundle& contents) {
 
 OwnedBundle fromVariant(GVariant* contents) {
   OwnedBundle target(bundle_create());
+  // A stranger may send keys by the ten thousand: looking each up in the list would take minutes.
+  std::unordered_set<std::string> known;
   GVariantIter entries;
   g_variant_iter_init(&entries, contents);
   const char* key = nullptr;
   GVariant* value = nullptr;
   while (g_variant_iter_loop(&entries, "{&sv}", &key, &value)) {
-    if (!add(*target, key, value)) {
+    if (!*key || known.count(key) || !append(*target, key, value)) {
       dlog_print(DLOG_WARN, "APPFW", "bundle entry \"%s\" of type %s is left out", key,
                  g_variant_get_type_string(value));
+      continue;
     }
+    known.insert(key);
   }
   return target;
 }

@@ -181,6 +181,10 @@ bundle* bundle_decode(const bundle_raw* r, const int len) {
   OwnedVariant contents(
       g_variant_ref_sink(g_variant_new_from_bytes(G_VARIANT_TYPE_VARDICT, bytes.get(), FALSE)));
   if (!g_variant_is_normal_form(contents.get())) return nullptr;
+  // Looked through once; of bytes that are not trusted every entry is checked along with all
+  // before.
+  contents.reset(
+      g_variant_ref_sink(g_variant_new_from_bytes(G_VARIANT_TYPE_VARDICT, bytes.get(), TRUE)));
   set_last_result(BUNDLE_ERROR_NONE);
   return appfw::fromVariant(contents.get()).release();
 }

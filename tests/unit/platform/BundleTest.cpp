@@ -152,6 +152,26 @@ TEST_F(Bundle, IsNotMadeOfOtherBytes) {
   EXPECT_EQ(bundle_decode(garbage, sizeof garbage), nullptr);
 }
 
+// With a look through all entries for every new key this would go on for hours.
+TEST_F(Bundle, OfAStrangerMayHaveVeryManyKeys) {
+  constexpr int kKeys = 300000;
+  GVariantBuilder entries;
+  g_variant_builder_init(&entries, G_VARIANT_TYPE_VARDICT);
+  for (int i = 0; i < kKeys; i++) {
+    g_variant_builder_add(&entries, "{sv}", std::to_string(i).c_str(), g_variant_new_string(""));
+  }
+  GVariant* contents = g_variant_ref_sink(g_variant_builder_end(&entries));
+  std::vector<bundle_raw> bytes(8 + g_variant_get_size(contents));
+  memcpy(bytes.data(), "bundle1\n", 8);
+  g_variant_store(contents, bytes.data() + 8);
+  g_variant_unref(contents);
+
+  bundle* back = bundle_decode(bytes.data(), static_cast<int>(bytes.size()));
+  ASSERT_NE(back, nullptr);
+  EXPECT_EQ(bundle_get_count(back), kKeys);
+  bundle_free(back);
+}
+
 TEST_F(Bundle, SurvivesEveryCutAndEveryFlippedByteOfItsBytes) {
   fill();
   const auto bytes = encoded();
