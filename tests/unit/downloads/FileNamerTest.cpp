@@ -76,6 +76,11 @@ TEST(FileNamer, NeverCutsACharacterInTwo) {
   EXPECT_EQ(name.substr(name.size() - 4), ".jpg");
 }
 
+TEST(FileNamer, LeavesNoBlankAtTheEndOfAShortenedName) {
+  const std::string name = safeName(std::string(254, 'a') + " b");
+  EXPECT_EQ(name, std::string(254, 'a'));
+}
+
 TEST(FileNamer, TakesAnEndlessExtensionForPartOfTheName) {
   EXPECT_EQ(safeName("a." + std::string(400, 'b')).size(), 255u);
 }

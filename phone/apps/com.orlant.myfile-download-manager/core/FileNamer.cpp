@@ -81,7 +81,7 @@ std::string safeName(const std::string& name) {
   if (!safe.empty() && safe[0] == '.') safe[0] = '_';
   if (safe.empty()) safe = kNameless;
   if (isReserved(safe)) safe.insert(0, 1, '_');
-  return withStem(safe, {});
+  return trimmed(withStem(safe, {}));
 }
 
 std::string numberedName(const std::string& safeName, unsigned int n) {
