@@ -5,7 +5,9 @@ namespace {
 
 constexpr int kMaxDepth = 32;
 
-// The parser recurses without a limit of its own: a megabyte of brackets would end the process.
+// The parser recurses without a limit of its own: a megabyte of brackets would end the process. It
+// also takes comments and texts in single quotes, in which a quote could hide brackets from this
+// look; no JSON has either.
 bool isShallow(std::string_view text) {
   int depth = 0;
   bool quoted = false;
@@ -16,10 +18,12 @@ bool isShallow(std::string_view text) {
       if (c == '"') quoted = false;
     } else if (c == '"') {
       quoted = true;
+    } else if (c == '/' || c == '\'') {
+      return false;
     } else if (c == '[' || c == '{') {
       if (++depth > kMaxDepth) return false;
     } else if (c == ']' || c == '}') {
-      depth--;
+      if (--depth < 0) return false;
     }
   }
   return true;
@@ -37,13 +41,18 @@ JsonTree parseJsonObject(std::string_view text) {
       !isShallow(text)) {
     return nullptr;
   }
+  // Of several documents in a row the parser gives the last and never frees the others. Between
+  // brackets there can be only one.
+  const std::string bracketed = "[" + std::string(text) + "]";
   const OwnedObject<JsonParser> parser(json_parser_new_immutable());
-  if (!json_parser_load_from_data(parser.get(), text.data(), static_cast<gssize>(text.size()),
-                                  nullptr)) {
+  if (!json_parser_load_from_data(parser.get(), bracketed.data(),
+                                  static_cast<gssize>(bracketed.size()), nullptr)) {
     return nullptr;
   }
-  JsonTree root(json_parser_steal_root(parser.get()));
-  return root && JSON_NODE_HOLDS_OBJECT(root.get()) ? std::move(root) : nullptr;
+  JsonArray* documents = json_node_get_array(json_parser_get_root(parser.get()));
+  JsonNode* root =
+      json_array_get_length(documents) == 1 ? json_array_get_element(documents, 0) : nullptr;
+  return JsonTree(root && JSON_NODE_HOLDS_OBJECT(root) ? json_node_copy(root) : nullptr);
 }
 
 std::optional<std::string> textMember(JsonObject* object, const char* name) {

@@ -37,7 +37,7 @@ bool isShallow(const std::string& json) {
     if (c == '/' || c == '#' || c == '\'') return false;
     if (c == '[' || c == '{') ++depth;
     if (c == ']' || c == '}') --depth;
-    if (depth > kDeepestNesting) return false;
+    if (depth > kDeepestNesting || depth < 0) return false;
   }
   return true;
 }
@@ -114,16 +114,22 @@ int ZQVSharedFiles::_load(int fd) {
 
 int ZQVSharedFiles::_parse(const std::string& text) {
   if (!isShallow(text)) return G_FILE_ERROR_INVAL;
+  // Of several documents in a row the parser gives the last and never frees the others. Between
+  // brackets there can be only one.
+  const std::string bracketed = "[" + text + "]";
   ZQVOwned<JsonParser, g_object_unref> parser(json_parser_new_immutable());
   GError* error = nullptr;
-  if (!json_parser_load_from_data(parser.get(), text.data(), static_cast<gssize>(text.size()),
-                                  &error)) {
+  if (!json_parser_load_from_data(parser.get(), bracketed.data(),
+                                  static_cast<gssize>(bracketed.size()), &error)) {
     // The parser's own numbers start at 0, which stands for success here.
     const int code = error && error->code ? error->code : G_FILE_ERROR_FAILED;
     g_clear_error(&error);
     return code;
   }
-  JsonNode* root = json_parser_get_root(parser.get());
-  if (root) _root.reset(json_node_ref(root));
+  JsonArray* documents = json_node_get_array(json_parser_get_root(parser.get()));
+  if (json_array_get_length(documents) > 1) return G_FILE_ERROR_INVAL;
+  if (json_array_get_length(documents) == 1) {
+    _root.reset(json_node_copy(json_array_get_element(documents, 0)));
+  }
   return 0;
 }

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <json-glib/json-glib.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -48,13 +49,25 @@ TEST_F(Index, KeepsMembersThatOthersPutThere) {
 }
 
 TEST_F(Index, StartsAnewOverAFileThatIsNoIndex) {
-  for (const char* garbage : {"", "{", "[1,2]", "null", "\xFF\xFE", "{\"a\":"}) {
+  const std::string deep(1 << 20, '[');
+  for (const std::string& garbage :
+       {std::string(), std::string("{"), std::string("[1,2]"), std::string("null"),
+        std::string("\xFF\xFE"), std::string("{\"a\":"), "{\"a\":" + deep,
+        "{\"a\":/*\"*/" + deep}) {
     folder.write("index.json", garbage);
     SharedIndex shared(folder / "index.json");
     EXPECT_FALSE(shared.find("http://a/1"));
     EXPECT_TRUE(shared.set("http://a/1", "/x/one"));
     EXPECT_EQ(shared.find("http://a/1").value(), "/x/one");
   }
+}
+
+TEST_F(Index, WaitsForNobodyWhoPutAPipeInItsPlace) {
+  ASSERT_EQ(mkfifo((folder / "index.json").c_str(), 0666), 0);
+  SharedIndex shared(folder / "index.json");
+  EXPECT_FALSE(shared.find("http://a/1"));
+  EXPECT_TRUE(shared.set("http://a/1", "/x/one"));
+  EXPECT_EQ(shared.find("http://a/1").value(), "/x/one");
 }
 
 TEST_F(Index, LosesNothingWhenTwoProcessesWriteAtOnce) {

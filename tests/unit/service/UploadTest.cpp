@@ -102,6 +102,7 @@ TEST_F(Upload, RefusesAnnouncementsThatMakeNoSense) {
            std::string("{") + to + R"(,"files":[{"name":"a","size":-1,"type":"t"}]})",
            std::string("{") + to + R"(,"files":[{"name":"a","size":4294967296,"type":"t"}]})",
            std::string("{") + to + R"(,"expires_in_s":0,)" + files + "}",
+           std::string("{}{") + to + "," + files + "}",
            std::string("{") + to + R"(,"expires_in_s":99999999999,)" + files + "}",
            "{\"to\":[\"+821012345678\"],\"files\":[{\"name\":\"\xff\xfe\",\"size\":1,\"type\":"
            "\"t\"}]}",
@@ -113,6 +114,8 @@ TEST_F(Upload, RefusesAnnouncementsThatMakeNoSense) {
 TEST_F(Upload, SurvivesAMegabyteOfBrackets) {
   EXPECT_EQ(post(std::string(1 << 20, '[')).status, 400U);
   EXPECT_EQ(post("{\"a\":" + std::string(1 << 20, '[')).status, 400U);
+  EXPECT_EQ(post("{\"a\":/*\"*/" + std::string(1 << 20, '[')).status, 400U);
+  EXPECT_EQ(post("{\"a\":'\"',\"b\":" + std::string(1 << 20, '[')).status, 400U);
   EXPECT_EQ(httpGet(url() + "/v1/stats").status, 200U);
 }
 

@@ -113,6 +113,15 @@ TEST_F(SharedFiles, SurviveAnyDepthOfNesting) {
   }
 }
 
+TEST_F(SharedFiles, AreOneDocument) {
+  for (const char* content : {"{}{}", "{}, {}", "17 18", "{}]} [{", "var x = {}"}) {
+    write(content);
+    log.clear();
+    EXPECT_EQ(pathOf("http://s/1"), "(null)");
+    EXPECT_THAT(log.errors(), ElementsAre(HasSubstr("gRet is "))) << content;
+  }
+}
+
 TEST_F(SharedFiles, AreReadEvenWhenNamesHoldBracketsAndQuotes) {
   write(R"({"http://s/1": "/x/\"[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[.jpg"})");
   EXPECT_EQ(pathOf("http://s/1"), "/x/\"[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[.jpg");

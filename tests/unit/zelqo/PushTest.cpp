@@ -58,11 +58,14 @@ TEST(APush, LeavesOutEventsThatMakeNoSense) {
 }
 
 TEST(APush, IsNothingElse) {
-  for (const std::string& text :
-       std::vector<std::string>{"", "x", "[]", "{}", R"({"events":[]})", R"({"cursor":1})",
-                                R"({"cursor":-1,"events":[]})", R"({"cursor":"1","events":[]})",
-                                R"({"cursor":1,"events":{}})", std::string(1 << 20, '['),
-                                R"({"a":)" + std::string(1 << 20, '['), "{\"\xff\":1}"}) {
+  for (const std::string& text : std::vector<std::string>{
+           "", "x", "[]", "{}", R"({"events":[]})", R"({"cursor":1})",
+           R"({"cursor":-1,"events":[]})", R"({"cursor":"1","events":[]})",
+           R"({"cursor":1,"events":{}})", std::string(1 << 20, '['),
+           R"({"a":)" + std::string(1 << 20, '['), "{\"\xff\":1}",
+           R"({"cursor":1,"events":[]}{"cursor":1,"events":[]})", R"({"cursor":1,"events":[]},{})",
+           R"(1{"cursor":1,"events":[]})", R"({"a":/*"*/)" + std::string(1 << 20, '['),
+           R"({"a":'"',"b":)" + std::string(1 << 20, '[')}) {
     EXPECT_FALSE(readPush(text)) << text.substr(0, 40);
   }
 }

@@ -1,13 +1,13 @@
 #include "SharedIndex.h"
 
+#include <common/Json.h>
+#include <common/Owned.h>
 #include <fcntl.h>
-#include <json-glib/json-glib.h>
 #include <sys/file.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <filesystem>
-
-#include <common/Owned.h>
 
 namespace downloads {
 namespace {
@@ -15,7 +15,10 @@ namespace {
 constexpr int kLockTries = 200;
 constexpr gulong kLockPauseUs = 10000;
 
-using OwnedNode = common::Owned<JsonNode, json_node_unref>;
+/// Some ten thousand entries; whoever reads the index takes no longer one.
+constexpr off_t kLargestFile = 8 << 20;
+
+using common::JsonTree;
 
 // Kept in a file of its own: the index itself is replaced on every change.
 class WriterLock {
@@ -40,22 +43,24 @@ class WriterLock {
   bool _held = false;
 };
 
-/// Null when there is no file or no object in it.
-OwnedNode readObject(const std::string& file) {
-  gchar* raw = nullptr;
-  gsize length = 0;
-  if (!g_file_get_contents(file.c_str(), &raw, &length, nullptr)) return nullptr;
-  const common::OwnedText text(raw);
-  JsonParser* parser = json_parser_new_immutable();
-  OwnedNode root;
-  if (json_parser_load_from_data(parser, raw, static_cast<gssize>(length), nullptr)) {
-    root.reset(json_parser_steal_root(parser));
-  }
-  g_object_unref(parser);
-  return root && JSON_NODE_HOLDS_OBJECT(root.get()) ? std::move(root) : nullptr;
+/// Others may write here, too: what is no regular file could keep its reader waiting.
+bool isReadable(const std::string& file) {
+  struct stat info {};
+  return stat(file.c_str(), &info) == 0 && S_ISREG(info.st_mode) && info.st_size <= kLargestFile;
 }
 
-OwnedNode withMember(const OwnedNode& old, const std::string& url, const std::string& path) {
+/// Null when there is no file or no object in it.
+JsonTree readObject(const std::string& file) {
+  gchar* raw = nullptr;
+  gsize length = 0;
+  if (!isReadable(file) || !g_file_get_contents(file.c_str(), &raw, &length, nullptr)) {
+    return nullptr;
+  }
+  const common::OwnedText text(raw);
+  return common::parseJsonObject({raw, length});
+}
+
+JsonTree withMember(const JsonTree& old, const std::string& url, const std::string& path) {
   JsonObject* object = json_object_new();
   if (old) {
     json_object_foreach_member(
@@ -66,7 +71,7 @@ OwnedNode withMember(const OwnedNode& old, const std::string& url, const std::st
         object);
   }
   json_object_set_string_member(object, url.c_str(), path.c_str());
-  OwnedNode root(json_node_new(JSON_NODE_OBJECT));
+  JsonTree root(json_node_new(JSON_NODE_OBJECT));
   json_node_take_object(root.get(), object);
   return root;
 }
