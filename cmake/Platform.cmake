@@ -11,7 +11,7 @@ function(platform_library name)
   target_include_directories(platform_${name} PUBLIC include PRIVATE src host)
   target_link_libraries(platform_${name} PUBLIC ${ARG_INTERFACES} PRIVATE ${ARG_LIBRARIES})
   set_target_properties(platform_${name} PROPERTIES OUTPUT_NAME zelqo-${name} VERSION 1)
-  install(TARGETS platform_${name} LIBRARY DESTINATION lib/zelqo-phone)
+  install(TARGETS platform_${name} LIBRARY DESTINATION lib/zelqo-phone NAMELINK_SKIP)
 
   add_library(platform_${name}_host INTERFACE)
   add_library(platform::${name}_host ALIAS platform_${name}_host)

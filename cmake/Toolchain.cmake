@@ -7,6 +7,11 @@ set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
 set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
 
+if(CMAKE_BUILD_WITH_INSTALL_RPATH)
+  # Programs that will find their libraries where they are installed are linked before that.
+  add_link_options(-Wl,-rpath-link,${CMAKE_LIBRARY_OUTPUT_DIRECTORY})
+endif()
+
 add_compile_options(-Wall -Wextra -Wformat=2)
 if(ZELQO_SANITIZE)
   add_compile_options(-fsanitize=address,undefined -fno-omit-frame-pointer)
