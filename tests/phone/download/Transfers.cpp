@@ -1,5 +1,7 @@
 #include "Transfers.h"
 
+#include <sys/socket.h>
+
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
@@ -117,6 +119,9 @@ void Gate::_serve(GSocketConnection* client) {
   const std::unique_ptr<GSocketConnection, Release> service(
       g_socket_client_connect_to_host(caller.get(), address.c_str(), 0, _end.get(), nullptr));
   if (service) {
+    // Else the service would send on into the system's buffers while nothing passes.
+    g_socket_set_option(g_socket_connection_get_socket(service.get()), SOL_SOCKET, SO_RCVBUF,
+                        static_cast<gint>(kPiece), nullptr);
     std::thread questions([&] { passQuestions(client, service.get(), _end.get()); });
     _passAnswers(service.get(), client);
     hangUp(client);

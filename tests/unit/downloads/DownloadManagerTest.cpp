@@ -2,8 +2,12 @@
 
 #include <gtest/gtest.h>
 #include <sys/resource.h>
+#include <sys/socket.h>
+#include <unistd.h>
 
+#include <algorithm>
 #include <csignal>
+#include <filesystem>
 #include <memory>
 
 #include "PartFile.h"
@@ -20,6 +24,31 @@ std::string bytes(std::size_t count) {
   return content;
 }
 
+// How many bytes may wait for a socket's reader; 0 when the file is no socket.
+int bufferOf(int file) {
+  int bytes = 0;
+  socklen_t size = sizeof bytes;
+  return getsockopt(file, SOL_SOCKET, SO_RCVBUF, &bytes, &size) == 0 ? bytes : 0;
+}
+
+// The most of any socket of this process.
+int largestBuffer() {
+  int largest = 0;
+  for (const auto& file : std::filesystem::directory_iterator("/proc/self/fd")) {
+    largest = std::max(largest, bufferOf(std::stoi(file.path().filename())));
+  }
+  return largest;
+}
+
+// What the system makes of a wish.
+int bufferFor(int bytes) {
+  const int file = socket(AF_INET, SOCK_STREAM, 0);
+  setsockopt(file, SOL_SOCKET, SO_RCVBUF, &bytes, sizeof bytes);
+  const int given = bufferOf(file);
+  close(file);
+  return given;
+}
+
 class Recorder : public DownloadManager::Observer {
  public:
   void onStarted(const Download& download) override { events += "started " + download.name + ";"; }
@@ -28,11 +57,15 @@ class Recorder : public DownloadManager::Observer {
   void onCancelled(const Download& download) override {
     events += "cancelled " + download.name + ";";
   }
-  void onChanged(const Download& download) override { received = download.received; }
+  void onChanged(const Download& download) override {
+    received = download.received;
+    buffered = std::max(buffered, largestBuffer());
+  }
   void onListChanged() override {}
 
   std::string events;
   std::uint64_t received = 0;
+  int buffered = 0;
 };
 
 class Manager : public testing::Test {
@@ -249,6 +282,13 @@ TEST_F(Manager, GoesOnByItselfAfterItWasKilled) {
   ASSERT_TRUE(waitForEnd());
   EXPECT_EQ(server.lastRange(), "bytes=500000-");
   EXPECT_EQ(TestFolder::read(folder / "files/a.bin"), server["/1"].body);
+}
+
+TEST_F(Manager, LeavesLittleOfAFileInBuffersWhereAKillWouldLoseIt) {
+  server["/1"].body = bytes(1000000);
+  fetch("/1", "a.bin", 1000000);
+  ASSERT_TRUE(waitForEnd());
+  EXPECT_EQ(recorder.buffered, bufferFor(1024 * 1024));
 }
 
 TEST_F(Manager, StartsOverWhenTheServiceHasAnotherFileNow) {

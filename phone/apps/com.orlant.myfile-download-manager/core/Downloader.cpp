@@ -1,11 +1,16 @@
 #include "Downloader.h"
 
+#include <sys/socket.h>
+
 #include "PartFile.h"
 
 namespace downloads {
 namespace {
 
 constexpr gsize kChunkBytes = 256 * 1024;
+// What has come as far as the system's buffers is lost when the application is killed, and asked
+// for again. Left alone, they may grow to tens of megabytes.
+constexpr gint kBufferBytes = 1024 * 1024;
 
 // A weak tag promises the same meaning, not the same bytes.
 bool isStrong(const std::string& etag) {
@@ -21,6 +26,12 @@ Failure failureOfError(const GError* error) {
   // A redirect loop, or something that is not HTTP.
   if (error->domain == SOUP_SESSION_ERROR) return Failure::Refused;
   return Failure::Network;
+}
+
+void connectingCb(SoupMessage*, GSocketClientEvent event, GIOStream* connection, gpointer) {
+  if (event != G_SOCKET_CLIENT_CONNECTING || !G_IS_SOCKET_CONNECTION(connection)) return;
+  GSocket* socket = g_socket_connection_get_socket(G_SOCKET_CONNECTION(connection));
+  g_socket_set_option(socket, SOL_SOCKET, SO_RCVBUF, kBufferBytes, nullptr);
 }
 
 }  // namespace
@@ -70,6 +81,7 @@ void Downloader::_request() {
     soup_message_headers_set_range(headers, static_cast<goffset>(_part->size()), -1);
     soup_message_headers_replace(headers, "If-Range", _job.etag.c_str());
   }
+  g_signal_connect(_message.get(), "network-event", G_CALLBACK(connectingCb), nullptr);
   _watchSilence();
   soup_session_send_async(_session.get(), _message.get(), G_PRIORITY_DEFAULT, _cancellable.get(),
                           _answeredCb, new Link(_self));
