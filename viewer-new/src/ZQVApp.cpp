@@ -75,6 +75,7 @@ std::vector<ZQVOwnedText> sentPaths(zelqo_share_h handle, unsigned int count) {
 template <typename Owner>
 std::vector<const char*> textsOf(const std::vector<Owner>& owners) {
   std::vector<const char*> texts;
+  texts.reserve(owners.size());
   for (const auto& owner : owners) texts.push_back(owner.get());
   return texts;
 }
