@@ -62,7 +62,7 @@ def _prepare(state, settings):
 
 def _configure_notifications(state, width):
     with open(os.path.join(ROOT, "phone", "etc", "dunstrc"), encoding="utf-8") as file:
-        text = file.read().replace("width = 720", f"width = {width}", 1)
+        text = file.read().replace("width = 688", f"width = {width - 32}", 1)
     text = text.replace("RECORDER", os.path.join(ROOT, "phone", "lib", "phone-message"))
     with open(state.path("run", "dunstrc"), "w", encoding="utf-8") as file:
         file.write(text)

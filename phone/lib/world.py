@@ -1,4 +1,4 @@
-"""The world around the phone: network, orientation, signals, settings, account, contacts."""
+"""The world around the phone: network, orientation, battery, signals, settings, account, contacts."""
 
 import shutil
 import sys
@@ -30,6 +30,11 @@ def network(state, args):
 def rotate(state, args):
     turns = ("0", "90", "180", "270")
     _tell_world(state, "SetRotation", _choice(args, turns, "phone rotate " + "|".join(turns)))
+
+
+def battery(state, args):
+    word = parse(args, words=(1, 1), usage="phone battery PERCENT").words[0]
+    _tell_world(state, "SetCharge", str(number(word, "the charge", 0, 100)))
 
 
 def signal(state, args):

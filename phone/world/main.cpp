@@ -5,6 +5,7 @@
 
 #include <cstdio>
 
+#include "Battery.h"
 #include "Clock.h"
 #include "Control.h"
 #include "Modem.h"
@@ -29,7 +30,7 @@ bool own(GDBusConnection* bus, const char* name) {
 bool ownAll(GDBusConnection* bus) {
   for (const char* name :
        {"org.freedesktop.NetworkManager", "net.hadess.SensorProxy", "org.freedesktop.timedate1",
-        "org.freedesktop.ModemManager1", "phone.World"}) {
+        "org.freedesktop.ModemManager1", "org.freedesktop.UPower", "phone.World"}) {
     if (!own(bus, name)) return false;
   }
   return true;
@@ -44,9 +45,10 @@ int main(int argc, char** argv) {
   OrientationSensor sensor(bus.get());
   Clock clock(bus.get());
   Modem modem(bus.get(), argc > 1 ? argv[1] : "");
-  Control control(bus.get(), network, sensor);
+  Battery battery(bus.get());
+  Control control(bus.get(), network, sensor, battery);
   if (!network.publish() || !sensor.publish() || !clock.publish() || !modem.publish() ||
-      !control.publish() || !ownAll(bus.get())) {
+      !battery.publish() || !control.publish() || !ownAll(bus.get())) {
     return 1;
   }
   puts("ready");

@@ -32,17 +32,26 @@ class PutAway : public testing::Environment {
   }
 };
 
+/// What the screen shows at a test's first failure, before its fixture puts the phone in order.
 class Pictures : public testing::EmptyTestEventListener {
-  void OnTestEnd(const testing::TestInfo& test) override {
-    if (!test.result()->Failed() || !current() || !current()->isUp()) return;
+  void OnTestStart(const testing::TestInfo&) override { _picture.clear(); }
+
+  void OnTestPartResult(const testing::TestPartResult& part) override {
+    const testing::TestInfo* test = testing::UnitTest::GetInstance()->current_test_info();
+    if (!part.failed() || !test || !_picture.empty() || !current() || !current()->isUp()) return;
     const std::string folder = std::string(BUILD_DIR) + "/test-results";
     std::filesystem::create_directories(folder);
-    const std::string file = folder + "/" + test.test_suite_name() + "." + test.name() + ".png";
-    if (current()->command({"screenshot", file}).status == 0) {
-      printf("the screen: %s\n", file.c_str());
-    }
-    printf("the end of the viewer's log:\n%s\n", end(current()->command({"log"}).out).c_str());
+    _picture = folder + "/" + test->test_suite_name() + "." + test->name() + ".png";
+    if (current()->command({"screenshot", _picture}).status != 0) _picture = "(none)";
   }
+
+  void OnTestEnd(const testing::TestInfo& test) override {
+    if (!test.result()->Failed() || !current() || !current()->isUp()) return;
+    printf("the screen: %s\nthe end of the viewer's log:\n%s\n", _picture.c_str(),
+           end(current()->command({"log"}).out).c_str());
+  }
+
+  std::string _picture;
 };
 
 }  // namespace

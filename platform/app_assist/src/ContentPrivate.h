@@ -15,7 +15,7 @@ struct WContentViewController::Private {
   std::vector<WPopupController*> popups;
   bool ending = false;
 
-  /// In the order of attachment; from now on no popup can be added.
+  /// At once, in the order of attachment; from now on no popup can be added.
   void closePopups();
 };
 

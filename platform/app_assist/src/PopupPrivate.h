@@ -20,7 +20,7 @@ struct WPopupController::PopupPrivate {
   std::string text;
   ContentBuilder builder;
   std::vector<std::unique_ptr<Button>> buttons;
-  /// The page that it is attached to, null once closed.
+  /// The page that it is attached to, null once it has ended.
   WContentViewController* page = nullptr;
   /// Attached and not yet closed.
   bool open = false;
@@ -31,6 +31,9 @@ struct WPopupController::PopupPrivate {
   void addContent(Evas_Object* popup) const;
   void addButtons(Evas_Object* popup) const;
   void watchView(WPopupController* popup);
+  static void stop(WPopupController* popup);
+  /// At once, whether it is open or still sliding out.
+  static void end(WPopupController* popup);
 
   static void clickedCb(void* data, Evas_Object*, void*);
   static void dismissedCb(void* data, Evas_Object*, void*);

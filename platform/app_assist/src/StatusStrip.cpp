@@ -4,14 +4,14 @@
 #include <net_connection.h>
 #include <vconf-keys.h>
 
-#include <cstring>
+#include <cstdlib>
 #include <ctime>
 #include <string>
 
 namespace app_assist {
 namespace {
 
-constexpr const char* kPowerSupplies = "/sys/class/power_supply";
+using OwnedMarkup = common::Owned<char, free>;
 
 const char* nameOf(connection_type_e type) {
   switch (type) {
@@ -36,25 +36,19 @@ connection_type_e currentNetwork() {
   return type;
 }
 
-/// Percent as the kernel writes it, empty without a battery.
-std::string batteryCharge() {
-  const common::Owned<GDir, g_dir_close> folder(g_dir_open(kPowerSupplies, 0, nullptr));
-  while (const char* name = folder ? g_dir_read_name(folder.get()) : nullptr) {
-    if (strncmp(name, "BAT", 3) != 0) continue;
-    char* text = nullptr;
-    const common::OwnedText path(g_build_filename(kPowerSupplies, name, "capacity", nullptr));
-    if (!g_file_get_contents(path.get(), &text, nullptr, nullptr)) continue;
-    const common::OwnedText owned(g_strchomp(text));
-    return owned.get();
-  }
-  return {};
+/// A fifth of the charge each, so that the picture of it has as many steps.
+int levelOf(int percent) {
+  return (percent + 10) / 20;
 }
 
 }  // namespace
 
-StatusStrip::StatusStrip(Evas_Object* layout) : _layout(layout) {
+StatusStrip::StatusStrip(Evas_Object* window, Evas_Object* layout)
+    : _layout(layout),
+      _banner(window),
+      _battery([this](int percent) { showBattery(percent); }),
+      _messages([this](const std::string& text) { showMessage(text); }) {
   showClock();
-  showBattery();
   waitForNextMinute();
   vconf_notify_key_changed(VCONFKEY_REGIONFORMAT_TIME1224, clockFormatCb, this);
   _networkSignals = std::make_unique<base::SignalSubscription>(
@@ -86,10 +80,21 @@ void StatusStrip::showClock() {
   elm_object_part_text_set(_layout, "clock", length ? start : "");
 }
 
-void StatusStrip::showBattery() {
-  const std::string charge = batteryCharge();
-  elm_object_part_text_set(_layout, "battery", charge.empty() ? "" : (charge + "%").c_str());
-  elm_object_signal_emit(_layout, charge.empty() ? "battery,hide" : "battery,show", "elm");
+void StatusStrip::showBattery(int percent) {
+  const bool known = percent >= 0;
+  elm_object_part_text_set(_layout, "battery",
+                           known ? (std::to_string(percent) + "%").c_str() : "");
+  const std::string signal = known ? "battery," + std::to_string(levelOf(percent)) : "battery,none";
+  elm_object_signal_emit(_layout, signal.c_str(), "elm");
+}
+
+/// The banner has room for all of it; when that has gone, the strip keeps its beginning for a
+/// while.
+void StatusStrip::showMessage(const std::string& text) {
+  const OwnedMarkup markup(evas_textblock_text_utf8_to_markup(nullptr, text.c_str()));
+  elm_object_part_text_set(_layout, "message", markup.get());
+  elm_object_signal_emit(_layout, "message,show", "elm");
+  _banner.show(markup.get());
 }
 
 void StatusStrip::showNetwork() {
@@ -110,7 +115,6 @@ void StatusStrip::waitForNextMinute() {
 Eina_Bool StatusStrip::minuteCb(void* data) {
   auto* self = static_cast<StatusStrip*>(data);
   self->showClock();
-  self->showBattery();
   self->waitForNextMinute();
   return ECORE_CALLBACK_CANCEL;
 }

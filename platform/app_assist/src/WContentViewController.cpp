@@ -82,7 +82,7 @@ void WContentViewController::attachPopup(WPopupController* popup) {
 void WContentViewController::Private::closePopups() {
   ending = true;
   const std::vector<WPopupController*> open = popups;
-  for (WPopupController* popup : open) popup->close();
+  for (WPopupController* popup : open) WPopupController::PopupPrivate::end(popup);
 }
 
 }  // namespace app_assist

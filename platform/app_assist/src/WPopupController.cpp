@@ -63,13 +63,30 @@ void WPopupController::addButton(const char* id, ButtonHandler handler) {
       std::make_unique<PopupPrivate::Button>(PopupPrivate::Button{this, id, std::move(handler)}));
 }
 
+/// It slides out as long as its page is there to be looked at, and ends once it is out of sight.
 void WPopupController::close() {
   if (!_p->open) return;
-  _p->open = false;
-  if (_p->page) erase(_p->page->_c->popups, this);
-  if (_v->window) erase(_v->window->_d->popups, this);
-  _p->page = nullptr;
-  LateDestroyer::instance().add(std::unique_ptr<WViewController>(this));
+  PopupPrivate::stop(this);
+  const bool canBeSeen = _v->view && evas_object_visible_get(_v->view);
+  if (canBeSeen && !_p->page->_c->ending) {
+    elm_popup_dismiss(_v->view);
+  } else {
+    PopupPrivate::end(this);
+  }
+}
+
+/// From now on it takes no presses, and back goes to what is below.
+void WPopupController::PopupPrivate::stop(WPopupController* popup) {
+  popup->_p->open = false;
+  if (popup->_v->window) erase(popup->_v->window->_d->popups, popup);
+}
+
+void WPopupController::PopupPrivate::end(WPopupController* popup) {
+  stop(popup);
+  if (!popup->_p->page) return;
+  erase(popup->_p->page->_c->popups, popup);
+  popup->_p->page = nullptr;
+  LateDestroyer::instance().add(std::unique_ptr<WViewController>(popup));
 }
 
 void WPopupController::PopupPrivate::setText(Evas_Object* object, const char* part,
@@ -116,11 +133,11 @@ void WPopupController::PopupPrivate::clickedCb(void* data, Evas_Object*, void*) 
 }
 
 void WPopupController::PopupPrivate::dismissedCb(void* data, Evas_Object*, void*) {
-  static_cast<WPopupController*>(data)->close();
+  end(static_cast<WPopupController*>(data));
 }
 
 void WPopupController::PopupPrivate::viewDeletedCb(void* data, Evas*, Evas_Object*, void*) {
-  static_cast<WPopupController*>(data)->close();
+  end(static_cast<WPopupController*>(data));
 }
 
 }  // namespace app_assist

@@ -65,7 +65,7 @@ void WWindowController::Private::open() {
   evas_object_size_hint_weight_set(frame, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
   elm_win_resize_object_add(window, frame);
   evas_object_show(frame);
-  strip = std::make_unique<StatusStrip>(frame);
+  strip = std::make_unique<StatusStrip>(window, frame);
   orientation = std::make_unique<Orientation>([this](int degrees) { rotate(degrees); });
 
   showBase();

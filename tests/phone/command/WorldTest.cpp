@@ -50,6 +50,14 @@ TEST(PhoneRotation, IsWhatTheOrientationSensorSays) {
   }
 }
 
+TEST(PhoneBattery, IsWhatThePowerServiceSays) {
+  thePhone()({"battery", "37"});
+  EXPECT_EQ(property("org.freedesktop.UPower", "/org/freedesktop/UPower/devices/DisplayDevice",
+                     "org.freedesktop.UPower.Device", "Percentage"),
+            "(<37.0>,)\n");
+  EXPECT_EQ(thePhone().command({"battery", "101"}).status, 2);
+}
+
 TEST(PhoneModem, HasACardWithThePhonesNumber) {
   EXPECT_EQ(property("org.freedesktop.ModemManager1", "/org/freedesktop/ModemManager1/SIM/0",
                      "org.freedesktop.ModemManager1.Sim", "Imsi"),

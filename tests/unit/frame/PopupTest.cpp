@@ -100,6 +100,34 @@ TEST_F(Popup, ClosesAfterTheHandlerThatAskedForIt) {
   EXPECT_EQ(slot, nullptr);
 }
 
+TEST_F(Popup, SlidesOutBeforeItGoes) {
+  page->attachPopup(newPopup());
+  evas_object_smart_callback_add(
+      slot->getEvasObj(), "dismissed",
+      [](void* data, Evas_Object*, void*) {
+        static_cast<Record*>(data)->push_back("out of sight");
+      },
+      &record);
+  slot->close();
+  EXPECT_TRUE(waitUntil([&] { return has("popup gone"); }));
+  EXPECT_EQ(record, (Record{"out of sight", "popup view deleted", "popup gone"}));
+}
+
+TEST_F(Popup, GoesWithItsPageWhileItSlidesOut) {
+  page->attachPopup(newPopup());
+  slot->close();
+  naviframe->destroyAllViewControllers();
+  EXPECT_EQ(record, (Record{"popup view deleted", "popup gone", "page view deleted", "page gone"}));
+}
+
+TEST_F(Popup, EndsWhenItsObjectIsDeletedWhileItSlidesOut) {
+  page->attachPopup(newPopup());
+  slot->close();
+  evas_object_del(slot->getEvasObj());
+  EXPECT_EQ(slot, nullptr);
+  EXPECT_TRUE(waitUntil([&] { return has("popup gone"); }));
+}
+
 TEST_F(Popup, StaysWhenTheHandlerDoesNotCloseIt) {
   newPopup()->addButton("OK", [](bool*) {});
   page->attachPopup(slot);

@@ -43,7 +43,9 @@ const Group kViewerGroups[] = {
 };
 
 const Group kDeviceGroups[] = {
-    {"elm/layout/phone/window", "elm.swallow.content clock battery network"},
+    {"elm/layout/phone/window", "elm.swallow.content clock battery network message"},
+    {"elm/layout/phone/message", "elm.text"},
+    {"elm/border/base/default", "elm.swallow.client elm.spacer.content elm.rect.background"},
     {"elm/naviframe/item/basic/default",
      "elm.text.title elm.swallow.prev_btn elm.swallow.content toolbar title_left_btn "
      "title_right_btn"},

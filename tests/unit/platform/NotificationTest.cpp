@@ -2,6 +2,7 @@
 
 #include <notification.h>
 #include <notification/post.h>
+#include <notification/status.h>
 
 #include <vector>
 
@@ -94,6 +95,15 @@ TEST(StatusMessage, TakesThePlaceOfTheOneBefore) {
   notification_status_message_post("second");
   ASSERT_TRUE(daemon.waitFor(2));
   EXPECT_GT(daemon.shown[1].replaces, 0u);
+}
+
+TEST(StatusMessage, ReachesEveryStatusBar) {
+  std::vector<std::string> heard;
+  const notification::StatusMessages one([&](const std::string& text) { heard.push_back(text); });
+  const notification::StatusMessages other([&](const std::string& text) { heard.push_back(text); });
+  notification_status_message_post("caf\xe9 & <b>");
+  EXPECT_TRUE(waitUntil([&] { return heard.size() == 2; }));
+  EXPECT_EQ(heard, std::vector<std::string>(2, "caf\xef\xbf\xbd & <b>"));
 }
 
 TEST(StatusMessage, NeedsAText) {

@@ -136,7 +136,7 @@ TEST_F(ThemeStyles, AreThereForEveryWidgetOfTheApplications) {
     EXPECT_TRUE(elm_object_style_set(elm_label_add(window()), style)) << "label " << style;
   for (const char* style : {"default", "no_effect"})
     EXPECT_TRUE(elm_object_style_set(elm_gengrid_add(window()), style)) << "grid " << style;
-  for (const char* group : {"list/C/type.1", "list/B/type.2", "strip/default"})
+  for (const char* group : {"list/C/type.1", "list/B/type.2"})
     EXPECT_TRUE(elm_layout_theme_set(elm_layout_add(window()), "layout", group, "default"))
         << group;
   EXPECT_TRUE(elm_layout_theme_set(elm_layout_add(window()), "layout", "phone", "window"));

@@ -7,7 +7,7 @@
 namespace app_assist {
 
 /// A popup at the bottom of the screen; back closes it. Configure it, then attachPopup() it to a
-/// page. It is destroyed after the handler that closed it has returned, never inside it.
+/// page, with which it goes. It is destroyed after the handler that closed it has returned.
 class WPopupController : public WViewController {
  public:
   /// Sets `*close` to true to close the popup; the popup may be gone when the handler returns.
@@ -29,7 +29,7 @@ class WPopupController : public WViewController {
   /// At most three, left to right: they become the parts "button1" to "button3".
   void addButton(const char* id, ButtonHandler handler);
 
-  /// Closes the popup; it is destroyed when the caller has returned to the main loop.
+  /// The popup slides out and takes no more presses; then it is destroyed, never inside the call.
   void close();
 
  private:
