@@ -5,26 +5,55 @@ namespace {
 
 constexpr int kMaxDepth = 32;
 
-// The parser recurses without a limit of its own: a megabyte of brackets would end the process. It
-// also takes comments and texts in single quotes, in which a quote could hide brackets from this
-// look; no JSON has either.
-bool isShallow(std::string_view text) {
+/// The number of an escaped character; -1 when the text begins with something else.
+int escapedCharacter(std::string_view text) {
+  if (text.size() < 6 || text[0] != '\\' || text[1] != 'u') return -1;
+  int number = 0;
+  for (std::size_t i = 2; i < 6; i++) {
+    const int digit = g_ascii_xdigit_value(text[i]);
+    if (digit < 0) return -1;
+    number = number * 16 + digit;
+  }
+  return number;
+}
+
+/// The length of an escape; 0 for a broken one or half a pair, over which the parser would forget
+/// to free the whole text.
+std::size_t lengthOfEscape(std::string_view text) {
+  if (text.substr(0, 2) != "\\u") return 2;
+  const int number = escapedCharacter(text);
+  if (number < 0) return 0;
+  if (number >> 11 != 0xd800 >> 11) return 6;
+  const bool pair = number < 0xdc00 && escapedCharacter(text.substr(6)) >> 10 == 0xdc00 >> 10;
+  return pair ? 12 : 0;
+}
+
+/// The length of the text behind its first quote, with its second; 0 for a broken one.
+std::size_t lengthOfText(std::string_view text) {
+  std::size_t at = 0;
+  while (at < text.size() && text[at] != '"') {
+    const std::size_t length = text[at] == '\\' ? lengthOfEscape(text.substr(at)) : 1;
+    if (length == 0) return 0;
+    at += length;
+  }
+  return at + 1;
+}
+
+/// Can the parser be trusted with it? It recurses without a limit of its own: a megabyte of
+/// brackets would end the process. It also takes comments and texts in single quotes, in which a
+/// quote could hide brackets from this look; no JSON has either.
+bool isHarmless(std::string_view text) {
   int depth = 0;
-  bool quoted = false;
-  for (std::size_t i = 0; i < text.size(); i++) {
-    const char c = text[i];
-    if (quoted) {
-      if (c == '\\') i++;
-      if (c == '"') quoted = false;
-    } else if (c == '"') {
-      quoted = true;
-    } else if (c == '/' || c == '\'') {
-      return false;
-    } else if (c == '[' || c == '{') {
-      if (++depth > kMaxDepth) return false;
-    } else if (c == ']' || c == '}') {
-      if (--depth < 0) return false;
-    }
+  for (std::size_t at = 0; at < text.size(); at++) {
+    const char c = text[at];
+    if (c == '/' || c == '\'') return false;
+    if (c == '[' || c == '{') depth++;
+    if (c == ']' || c == '}') depth--;
+    if (depth < 0 || depth > kMaxDepth) return false;
+    if (c != '"') continue;
+    const std::size_t length = lengthOfText(text.substr(at + 1));
+    if (length == 0) return false;
+    at += length;
   }
   return true;
 }
@@ -38,7 +67,7 @@ JsonNode* valueMember(JsonObject* object, const char* name) {
 
 JsonTree parseJsonObject(std::string_view text) {
   if (!g_utf8_validate(text.data(), static_cast<gssize>(text.size()), nullptr) ||
-      !isShallow(text)) {
+      !isHarmless(text)) {
     return nullptr;
   }
   // Of several documents in a row the parser gives the last and never frees the others. Between

@@ -20,20 +20,47 @@ bool isSameFile(const struct stat& a, const struct stat& b) {
          a.st_mtim.tv_sec == b.st_mtim.tv_sec && a.st_mtim.tv_nsec == b.st_mtim.tv_nsec;
 }
 
-/// The index of the quote that ends the text starting behind `start`.
+/// The number of an escaped character; -1 when there is something else.
+int escapedCharacter(const std::string& json, size_t at) {
+  if (at + 5 >= json.size() || json[at] != '\\' || json[at + 1] != 'u') return -1;
+  int number = 0;
+  for (size_t i = at + 2; i < at + 6; ++i) {
+    const int digit = g_ascii_xdigit_value(json[i]);
+    if (digit < 0) return -1;
+    number = number * 16 + digit;
+  }
+  return number;
+}
+
+/// The length of an escape; 0 for a broken one or half a pair, over which the parser would forget
+/// to free the whole text.
+size_t lengthOfEscape(const std::string& json, size_t at) {
+  if (json.compare(at, 2, "\\u") != 0) return 2;
+  const int number = escapedCharacter(json, at);
+  if (number < 0) return 0;
+  if (number >> 11 != 0xd800 >> 11) return 6;
+  const bool pair = number < 0xdc00 && escapedCharacter(json, at + 6) >> 10 == 0xdc00 >> 10;
+  return pair ? 12 : 0;
+}
+
+/// The index of the quote that ends the text starting behind `start`; 0 for a broken text.
 size_t endOfText(const std::string& json, size_t start) {
   size_t at = start + 1;
-  while (at < json.size() && json[at] != '"') at += json[at] == '\\' ? 2 : 1;
+  while (at < json.size() && json[at] != '"') {
+    const size_t length = json[at] == '\\' ? lengthOfEscape(json, at) : 1;
+    if (length == 0) return 0;
+    at += length;
+  }
   return at;
 }
 
-/// Is the nesting shallow enough to be parsed? Comments and single quotes, which the parser would
-/// accept, could hide brackets from this look and are refused.
-bool isShallow(const std::string& json) {
+/// Can the parser be trusted with it? It recurses as deep as the brackets go, and accepts comments
+/// and single quotes, which could hide brackets from this look.
+bool isHarmless(const std::string& json) {
   int depth = 0;
   for (size_t at = 0; at < json.size(); ++at) {
     const char c = json[at];
-    if (c == '"') at = endOfText(json, at);
+    if (c == '"' && (at = endOfText(json, at)) == 0) return false;
     if (c == '/' || c == '#' || c == '\'') return false;
     if (c == '[' || c == '{') ++depth;
     if (c == ']' || c == '}') --depth;
@@ -113,7 +140,7 @@ int ZQVSharedFiles::_load(int fd) {
 }
 
 int ZQVSharedFiles::_parse(const std::string& text) {
-  if (!isShallow(text)) return G_FILE_ERROR_INVAL;
+  if (!isHarmless(text)) return G_FILE_ERROR_INVAL;
   // Of several documents in a row the parser gives the last and never frees the others. Between
   // brackets there can be only one.
   const std::string bracketed = "[" + text + "]";

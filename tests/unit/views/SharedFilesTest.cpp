@@ -122,6 +122,18 @@ TEST_F(SharedFiles, AreOneDocument) {
   }
 }
 
+TEST_F(SharedFiles, MayEscapeTheirLettersButNotHalfAPair) {
+  write(R"({"http://s/1": "/x/\ud83d\uDE00.jpg"})");
+  EXPECT_EQ(pathOf("http://s/1"), "/x/\xF0\x9F\x98\x80.jpg");
+  for (const char* half : {R"(\ud83d)", R"(\uD83D\u0041)", R"(\ud83d\ud83d)", R"(\ud83d\ude0)",
+                           R"(\uda\)", R"(\ude00)", R"(\ude00\ud83d)", R"(\u)"}) {
+    write(std::string("{\"http://s/1\": \"") + half + "\"}");
+    log.clear();
+    EXPECT_EQ(pathOf("http://s/1"), "(null)") << half;
+    EXPECT_THAT(log.errors(), ElementsAre(HasSubstr("gRet is "))) << half;
+  }
+}
+
 TEST_F(SharedFiles, AreReadEvenWhenNamesHoldBracketsAndQuotes) {
   write(R"({"http://s/1": "/x/\"[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[.jpg"})");
   EXPECT_EQ(pathOf("http://s/1"), "/x/\"[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[[.jpg");

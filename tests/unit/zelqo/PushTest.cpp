@@ -70,6 +70,13 @@ TEST(APush, IsNothingElse) {
   }
 }
 
+TEST(APush, MayEscapeItsLetters) {
+  const auto push = readPush(
+      received(R"({"from":"1","expires_ms":1,"files":[{"name":"\ud83d\uDE00 \\ud83d"}]})"));
+  ASSERT_TRUE(push);
+  EXPECT_EQ(push->events[0].share.files[0].name, "\xF0\x9F\x98\x80 \\ud83d");
+}
+
 TEST(APush, LosesWhatIsTooLongAndKeepsTheRest) {
   const auto push = readPush(received(R"({"from":"1","expires_ms":1,"files":[{"name":")" +
                                       std::string(10000, 'x') + R"(","size":-5,"type":"t"}]})"));
