@@ -102,8 +102,9 @@ void ZQVLocalList::append(const char* const* paths, int count, Eina_List** items
     }
     item->fileName = g_strdup(name.c_str());
     item->filePath = g_strdup(path);
+    // NOLINTNEXTLINE(clang-analyzer-cplusplus.NewDeleteLeaks): the list owns its items
     *items = eina_list_append(*items, item.release());
-  }  // NOLINT(clang-analyzer-cplusplus.NewDeleteLeaks): the list owns its items
+  }
 }
 
 std::unique_ptr<ZQViewerThumbnailItem> ZQVLocalList::_createItem(const char* path, int number) {
