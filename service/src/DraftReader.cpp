@@ -13,8 +13,8 @@ constexpr guint kMaxFiles = 10000;
 constexpr std::size_t kMaxName = 4096;
 constexpr std::size_t kMaxType = 255;
 constexpr std::size_t kMaxAddress = 8192;
-constexpr std::int64_t kDefaultLifetimeS = 14 * 24 * 3600;
-constexpr std::int64_t kMaxLifetimeS = 90 * 24 * 3600;
+constexpr std::int64_t kDefaultLifetimeS = std::int64_t{14} * 24 * 3600;
+constexpr std::int64_t kMaxLifetimeS = std::int64_t{90} * 24 * 3600;
 
 bool fits(const std::optional<std::string>& text, std::size_t limit) {
   return !text || text->size() <= limit;

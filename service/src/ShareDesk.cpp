@@ -8,7 +8,7 @@
 namespace service {
 namespace {
 
-constexpr std::int64_t kLongestWaitMs = 3600 * 1000;
+constexpr std::int64_t kLongestWaitMs = std::int64_t{3600} * 1000;
 // How long a phone that was switched off can still learn what became of a share.
 constexpr std::int64_t kRememberMs = std::int64_t{100} * 24 * 3600 * 1000;
 

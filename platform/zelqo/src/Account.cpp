@@ -53,7 +53,7 @@ std::string Account::servicePath() const {
   return "/v1/subscribers/" + _msisdn + "/services/2";
 }
 
-void Account::signUp(const std::string& imsi, SignedUpCb done) {
+void Account::signUp(const std::string& imsi, const SignedUpCb& done) {
   ServiceClient::Request request;
   request.method = "POST";
   request.path = "/v1/subscribers";
@@ -68,7 +68,7 @@ void Account::signUp(const std::string& imsi, SignedUpCb done) {
   if (!sent) done(ZELQO_ERROR_NETWORK);
 }
 
-void Account::querySharing(SharingCb done) {
+void Account::querySharing(const SharingCb& done) {
   ServiceClient::Request request;
   request.path = servicePath();
   request.key = _store.accessKey(_msisdn);
@@ -77,7 +77,7 @@ void Account::querySharing(SharingCb done) {
   if (!sent) done(ZELQO_ERROR_NETWORK, false);
 }
 
-void Account::switchSharing(bool on, SharingCb done) {
+void Account::switchSharing(bool on, const SharingCb& done) {
   ServiceClient::Request request;
   request.method = "PUT";
   request.path = servicePath();

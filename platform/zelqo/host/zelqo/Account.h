@@ -24,10 +24,10 @@ class Account {
   Account& operator=(const Account&) = delete;
 
   /// The number gets a new key, which the store keeps.
-  void signUp(const std::string& imsi, SignedUpCb done);
+  void signUp(const std::string& imsi, const SignedUpCb& done);
   bool signedUp();
-  void querySharing(SharingCb done);
-  void switchSharing(bool on, SharingCb done);
+  void querySharing(const SharingCb& done);
+  void switchSharing(bool on, const SharingCb& done);
 
  private:
   std::string servicePath() const;
