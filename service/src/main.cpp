@@ -1,3 +1,5 @@
+#include <unistd.h>
+
 #include <csignal>
 #include <cstdio>
 
@@ -65,6 +67,8 @@ std::string thumbnailProgram() {
   return std::string(folder.get()) + "/zelqo-thumbnailer";
 }
 
+constexpr unsigned kGoodbyeS = 1;
+
 gboolean stopCb(gpointer loop) {
   g_main_loop_quit(static_cast<GMainLoop*>(loop));
   return G_SOURCE_CONTINUE;
@@ -95,5 +99,8 @@ int main(int argc, char** argv) {
   printf("ready: %s\n", server.url().c_str());
   fflush(stdout);
   g_main_loop_run(loop.get());
+  // Connections are closed with a goodbye, for which a client may let us wait as long as it likes.
+  signal(SIGALRM, [](int) { _exit(0); });
+  alarm(kGoodbyeS);
   return 0;
 }

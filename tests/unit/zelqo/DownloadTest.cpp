@@ -6,7 +6,8 @@
 #include <algorithm>
 #include <cstdlib>
 #include <filesystem>
-#include <set>
+#include <memory>
+#include <utility>
 #include <vector>
 
 #include "Downloader.h"
@@ -259,31 +260,30 @@ TEST_F(Download, SurvivesAFolderThatVanishes) {
   EXPECT_NE(_arrivals[1].error, 0);
 }
 
+// Answers nobody before a sixth has asked, and gives a seventh a moment to come.
 TEST_F(Download, UsesAtMostSixConnections) {
-  std::set<SoupServerMessage*> open;
+  constexpr std::size_t kConnections = 6, kRequests = 48;
+  std::vector<SoupServerMessage*> held;
   std::size_t most = 0;
+  const auto answerAll = [](gpointer messages) -> gboolean {
+    for (SoupServerMessage* message :
+         std::exchange(*static_cast<std::vector<SoupServerMessage*>*>(messages), {})) {
+      soup_server_message_unpause(message);
+    }
+    return G_SOURCE_REMOVE;
+  };
   FakeServer server([&](SoupServerMessage* message, const std::string&) {
-    open.insert(message);
-    most = std::max(most, open.size());
-    g_signal_connect(message, "finished", G_CALLBACK(+[](SoupServerMessage* sent, gpointer set) {
-                       static_cast<std::set<SoupServerMessage*>*>(set)->erase(sent);
-                     }),
-                     &open);
     answerWith(message, 200, kPng);
     soup_server_message_pause(message);
-    g_timeout_add(
-        5,
-        [](gpointer held) -> gboolean {
-          soup_server_message_unpause(static_cast<SoupServerMessage*>(held));
-          return G_SOURCE_REMOVE;
-        },
-        message);
+    held.push_back(message);
+    most = std::max(most, held.size());
+    if (held.size() == kConnections) g_timeout_add(20, answerAll, &held);
   });
   std::vector<std::string> urls;
-  for (int i = 0; i < 40; i++) urls.push_back(server.url("/" + std::to_string(i)));
+  for (std::size_t i = 0; i < kRequests; i++) urls.push_back(server.url("/" + std::to_string(i)));
   ASSERT_EQ(request(urls), 0);
-  ASSERT_TRUE(arrived(40));
-  EXPECT_EQ(most, 6U);
+  ASSERT_TRUE(arrived(kRequests));
+  EXPECT_EQ(most, kConnections);
 }
 
 TEST_F(Download, MayBeOrderedFromTheCallback) {
@@ -324,20 +324,47 @@ TEST_F(Download, ClearsAwayWhatAnEarlierProcessLeft) {
   EXPECT_TRUE(std::filesystem::exists(fresh));
 }
 
-TEST_F(Download, TrustsNoCertificateThatNobodyVouchesFor) {
-  const TempFolder folder;
-  const std::string make =
-      "openssl req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=127.0.0.1 " +
-      std::string("-addext subjectAltName=IP:127.0.0.1 -keyout ") + folder.path("key.pem") +
-      " -out " + folder.path("cert.pem") + " >/dev/null 2>&1 </dev/null";
-  if (system(make.c_str()) != 0) GTEST_SKIP() << "openssl makes the certificate, and is not there";
-  const ServiceProcess service(folder.path("data"), {"--tls-cert", folder.path("cert.pem"),
-                                                     "--tls-key", folder.path("key.pem")});
-  ASSERT_EQ(service.url().substr(0, 8), "https://");
-  zelqo::Downloader downloader(hasty());
-  requestFrom(downloader, {service.url() + "/v1/stats"});
-  ASSERT_TRUE(arrived(1));
-  EXPECT_EQ(_arrivals[0].error, ZELQO_ERROR_NETWORK);
+// A service behind a certificate that it signed itself.
+class SecureService : public Download {
+ protected:
+  void SetUp() override {
+    const std::string make =
+        "openssl req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=127.0.0.1 " +
+        std::string("-addext subjectAltName=IP:127.0.0.1 -keyout ") + _own.path("key.pem") +
+        " -out " + _own.path("cert.pem") + " >/dev/null 2>&1 </dev/null";
+    if (system(make.c_str()) != 0) {
+      GTEST_SKIP() << "openssl makes the certificate, and is not there";
+    }
+    _service = std::make_unique<ServiceProcess>(
+        _own.path("data"), std::vector<std::string>{"--tls-cert", _own.path("cert.pem"),
+                                                    "--tls-key", _own.path("key.pem")});
+    ASSERT_EQ(_service->url().substr(0, 8), "https://");
+  }
+  ServiceProcess& service() { return *_service; }
+  void expectRefusal() {
+    zelqo::Downloader downloader(hasty());
+    requestFrom(downloader, {service().url() + "/v1/stats"});
+    ASSERT_TRUE(arrived(1));
+    EXPECT_EQ(_arrivals[0].error, ZELQO_ERROR_NETWORK);
+  }
+
+ private:
+  const TempFolder _own;
+  std::unique_ptr<ServiceProcess> _service;
+};
+
+TEST_F(SecureService, IsNotTrustedWhenNobodyVouchesForIt) {
+  expectRefusal();
+}
+
+TEST_F(SecureService, EndsThoughSomebodyNeverShakesHands) {
+  const base::Owned<GSocketClient, g_object_unref> client(g_socket_client_new());
+  const base::Owned<GSocketConnection, g_object_unref> silent(g_socket_client_connect_to_host(
+      client.get(), "127.0.0.1", static_cast<guint16>(std::stoi(service().port())), nullptr,
+      nullptr));
+  ASSERT_TRUE(silent);
+  expectRefusal();  // by now it knows of the one before
+  EXPECT_EQ(service().stop(), 0);
 }
 
 }  // namespace
