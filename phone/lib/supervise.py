@@ -110,14 +110,32 @@ class Phone:
         self._wake_contacts()
 
     def _start_system(self):
-        self.vital(buses.start(self, "system"))
-        world = self.tool("phone-world")
-        if world:
-            self.program("world", [world, self.settings["number"]]).start_and_read()
-        recorder = self.tool("phone-signal")
-        if recorder:
-            self.program("signals", [recorder, "--record", os.path.join(self.run, "signals")]) \
-                .start_and_read()
+        """A system bus that ends is started again, as on any machine, and what lives on it too."""
+        begun = self._begin_system()
+
+        def watch(programs):
+            while True:
+                programs[0].wait()
+                if self.over.is_set():
+                    return
+                print("system-bus ended and is started again", flush=True)
+                for program in programs:
+                    program.end()
+                    self.programs.remove(program)
+                programs = self._begin_system()
+
+        threading.Thread(target=watch, args=(begun,), daemon=True).start()
+
+    def _begin_system(self):
+        begun = [buses.start(self, "system")]
+        for name, tool, arguments in (
+                ("world", "phone-world", [self.settings["number"]]),
+                ("signals", "phone-signal", ["--record", os.path.join(self.run, "signals")])):
+            path = self.tool(tool)
+            if path:
+                begun.append(self.program(name, [path] + arguments))
+                begun[-1].start_and_read()
+        return begun
 
     def _wake_contacts(self):
         """Their first start takes longest of all, so it goes on beside everything else. The

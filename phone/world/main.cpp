@@ -41,6 +41,8 @@ bool ownAll(GDBusConnection* bus) {
 int main(int argc, char** argv) {
   const common::OwnedBus bus = base::systemBus();
   if (!bus) return 1;
+  // With a new bus the world begins anew.
+  g_dbus_connection_set_exit_on_close(bus.get(), TRUE);
   Network network(bus.get());
   OrientationSensor sensor(bus.get());
   Clock clock(bus.get());

@@ -33,9 +33,9 @@ void addArguments(JsonBuilder* builder, GVariant* body) {
 
 }  // namespace
 
-Recorder::Recorder(common::OwnedBus bus, const char* file)
+Recorder::Recorder(const char* file)
     : _file(fopen(file, "ae")),
-      _signals(std::move(bus), {nullptr, nullptr, nullptr, nullptr}, _signalCb, this) {}
+      _signals(base::BusKind::System, {nullptr, nullptr, nullptr, nullptr}, _signalCb, this) {}
 
 void Recorder::_signalCb(GDBusConnection*, const char* sender, const char* path,
                          const char* interface, const char* member, GVariant* body, gpointer data) {

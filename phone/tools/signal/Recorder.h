@@ -9,7 +9,7 @@
 class Recorder {
  public:
   /// Appends to the file; check isOpen().
-  Recorder(common::OwnedBus bus, const char* file);
+  explicit Recorder(const char* file);
 
   bool isOpen() const { return _file != nullptr; }
 

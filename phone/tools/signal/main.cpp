@@ -32,9 +32,8 @@ int send(const char* member, const char* text) {
 }
 
 int record(const char* file) {
-  common::OwnedBus bus = base::systemBus();
-  if (!bus) return 1;
-  const Recorder recorder(std::move(bus), file);
+  if (!base::systemBus()) return 1;
+  const Recorder recorder(file);
   if (!recorder.isOpen()) return fail("the record cannot be written");
   puts("ready");
   fflush(stdout);

@@ -21,7 +21,8 @@ struct DownloadNotifier::Posted {
 
 DownloadNotifier::DownloadNotifier()
     : _bus(base::sessionBus()),
-      _invoked(base::sessionBus(), {nullptr, kService, "ActionInvoked", kPath}, _invokedCb, this) {}
+      _invoked(base::BusKind::Session, {nullptr, kService, "ActionInvoked", kPath}, _invokedCb,
+               this) {}
 
 void DownloadNotifier::post(const std::string& message, std::function<void()> onTap) {
   if (!_bus) return;

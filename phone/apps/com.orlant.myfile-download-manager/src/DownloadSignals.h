@@ -1,7 +1,5 @@
 #pragma once
 
-#include <base/Bus.h>
-
 #include <string>
 
 namespace downloads {
@@ -10,8 +8,6 @@ namespace downloads {
 /// file's address.
 class DownloadSignals {
  public:
-  DownloadSignals() : _bus(base::systemBus()) {}
-
   void downloading(const std::string& url) { _emit("file_downloading", url); }
   void downloaded(const std::string& url) { _emit("file_downloaded", url); }
   /// Failed or cancelled: it can be asked for again.
@@ -19,8 +15,6 @@ class DownloadSignals {
 
  private:
   void _emit(const char* member, const std::string& url);
-
-  common::OwnedBus _bus;
 };
 
 }  // namespace downloads

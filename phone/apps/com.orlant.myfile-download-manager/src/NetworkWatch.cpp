@@ -20,7 +20,7 @@ Network currentNetwork() {
 
 NetworkWatch::NetworkWatch(std::function<void(Network)> onChange)
     : _onChange(std::move(onChange)),
-      _changed(base::systemBus(),
+      _changed(base::BusKind::System,
                {nullptr, "org.freedesktop.DBus.Properties", "PropertiesChanged",
                 "/org/freedesktop/NetworkManager"},
                _changedCb, this) {

@@ -28,7 +28,7 @@ bool isOfStore(GFile* file) {
 StoreWatch::StoreWatch(std::function<void()> onChange)
     : _onChange(std::move(onChange)),
       _monitor(watchFolder(base::databaseFolder())),
-      _recalled(base::systemBus(),
+      _recalled(base::BusKind::System,
                 {nullptr, "org.tizen.call.remote.share", "recall", "/com/orlant/remoteshare"},
                 _recalledCb, this) {
   if (_monitor) g_signal_connect(_monitor.get(), "changed", G_CALLBACK(_writtenCb), this);
