@@ -5,6 +5,8 @@
 
 #include <functional>
 
+#include "ZQVTimer.h"
+
 /// What the download application tells about its progress on the system bus.
 class ZQVDownloadSignals {
  public:
@@ -17,7 +19,8 @@ class ZQVDownloadSignals {
   ZQVDownloadSignals(const ZQVDownloadSignals&) = delete;
   ZQVDownloadSignals& operator=(const ZQVDownloadSignals&) = delete;
 
-  /// Follows the signals until stop(); without a system bus it logs and nothing ever arrives.
+  /// Follows the signals until stop(); without a system bus it logs and nothing ever arrives. When
+  /// the bus goes, it waits for it to come back.
   void start(Handler handler);
   void stop();
 
@@ -28,12 +31,18 @@ class ZQVDownloadSignals {
   static void _signalCb(GDBusConnection* bus, const gchar* sender, const gchar* path,
                         const gchar* interface, const gchar* member, GVariant* parameters,
                         gpointer data);
+  static void _closedCb(GDBusConnection* bus, gboolean vanished, GError* error, gpointer data);
+  bool _connect(GError** error);
+  void _disconnect();
+  bool _reconnect();
   guint _subscribe(const char* member);
   void _unsubscribe(guint& subscription);
 
   GDBusConnection* _bus = nullptr;
+  gulong _closed = 0;
   guint _downloading = 0;
   guint _downloaded = 0;
   guint _failed = 0;
   Handler _handler;
+  ZQVTimer _again;
 };

@@ -14,6 +14,7 @@ constexpr const char* kDownloading = "file_downloading";
 constexpr const char* kDownloaded = "file_downloaded";
 // Failed or cancelled: the user may ask for the file again.
 constexpr const char* kFailed = "file_failed";
+constexpr double kReconnectSeconds = 1.0;
 
 }  // namespace
 
@@ -21,21 +22,45 @@ void ZQVDownloadSignals::start(Handler handler) {
   stop();
   _handler = std::move(handler);
   ZQVOwned<GError, g_error_free> error;
-  _bus = g_bus_get_sync(G_BUS_TYPE_SYSTEM, nullptr, error.out());
-  if (!_bus) {
+  if (!_connect(error.out())) {
     ZQV_ERROR("bus is NULL! errorMessage:[%s]", error ? error->message : "");
-    return;
   }
-  _downloading = _subscribe(kDownloading);
-  _downloaded = _subscribe(kDownloaded);
-  _failed = _subscribe(kFailed);
 }
 
 void ZQVDownloadSignals::stop() {
+  _again.stop();
+  _disconnect();
+}
+
+bool ZQVDownloadSignals::_connect(GError** error) {
+  _bus = g_bus_get_sync(G_BUS_TYPE_SYSTEM, nullptr, error);
+  if (!_bus) return false;
+  // A bus that goes does not take the page with it.
+  g_dbus_connection_set_exit_on_close(_bus, FALSE);
+  _closed = g_signal_connect(_bus, "closed", G_CALLBACK(_closedCb), this);
+  _downloading = _subscribe(kDownloading);
+  _downloaded = _subscribe(kDownloaded);
+  _failed = _subscribe(kFailed);
+  return true;
+}
+
+void ZQVDownloadSignals::_disconnect() {
   _unsubscribe(_failed);
   _unsubscribe(_downloaded);
   _unsubscribe(_downloading);
+  if (_bus) g_clear_signal_handler(&_closed, _bus);
   g_clear_object(&_bus);
+}
+
+void ZQVDownloadSignals::_closedCb(GDBusConnection*, gboolean, GError*, gpointer data) {
+  auto* signals = static_cast<ZQVDownloadSignals*>(data);
+  signals->_again.start(kReconnectSeconds, [signals] { return !signals->_reconnect(); });
+}
+
+/// The connection stays the closed one as long as anybody in this process has it.
+bool ZQVDownloadSignals::_reconnect() {
+  _disconnect();
+  return _connect(nullptr) && !g_dbus_connection_is_closed(_bus);
 }
 
 int32_t ZQVDownloadSignals::statusOf(const char* member) {

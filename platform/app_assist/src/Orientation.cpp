@@ -28,23 +28,36 @@ int degreesOf(const char* orientation) {
 }  // namespace
 
 Orientation::Orientation(std::function<void(int)> changed)
-    : _changed(std::move(changed)), _cancellable(g_cancellable_new()) {
-  g_dbus_proxy_new_for_bus(G_BUS_TYPE_SYSTEM, G_DBUS_PROXY_FLAGS_DO_NOT_AUTO_START, nullptr,
-                           kService, kPath, kService, _cancellable, proxyReadyCb, this);
+    : _changed(std::move(changed)),
+      _cancellable(g_cancellable_new()),
+      _busReturn(base::BusKind::System, [this] { connect(); }) {
+  connect();
 }
 
 Orientation::~Orientation() {
   g_cancellable_cancel(_cancellable);
   g_object_unref(_cancellable);
+  dropProxy();
+}
+
+void Orientation::connect() {
+  dropProxy();
+  const common::OwnedBus bus = base::systemBus();
+  if (!bus) return;
+  g_dbus_proxy_new(bus.get(), G_DBUS_PROXY_FLAGS_DO_NOT_AUTO_START, nullptr, kService, kPath,
+                   kService, _cancellable, proxyReadyCb, this);
+}
+
+void Orientation::dropProxy() {
   if (!_proxy) return;
   g_signal_handlers_disconnect_by_data(_proxy, this);
-  g_object_unref(_proxy);
+  g_clear_object(&_proxy);
 }
 
 /// A cancelled call comes back after this object is gone, so the result is looked at first.
 void Orientation::proxyReadyCb(GObject*, GAsyncResult* result, void* data) {
   GError* error = nullptr;
-  GDBusProxy* proxy = g_dbus_proxy_new_for_bus_finish(result, &error);
+  GDBusProxy* proxy = g_dbus_proxy_new_finish(result, &error);
   const common::OwnedError owned(error);
   if (proxy) {
     static_cast<Orientation*>(data)->setProxy(proxy);
@@ -54,6 +67,7 @@ void Orientation::proxyReadyCb(GObject*, GAsyncResult* result, void* data) {
 }
 
 void Orientation::setProxy(GDBusProxy* proxy) {
+  dropProxy();
   _proxy = proxy;
   g_signal_connect(proxy, "notify::g-name-owner", G_CALLBACK(ownerChangedCb), this);
   g_signal_connect(proxy, "g-properties-changed", G_CALLBACK(propertiesChangedCb), this);

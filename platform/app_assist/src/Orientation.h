@@ -1,7 +1,7 @@
 /// How the phone is held, as its orientation sensor says.
 #pragma once
 
-#include <gio/gio.h>
+#include <base/Bus.h>
 
 #include <functional>
 
@@ -22,6 +22,8 @@ class Orientation {
   static void propertiesChangedCb(GDBusProxy*, GVariant*, const char* const*, void* data);
   static void claimedCb(GObject* proxy, GAsyncResult* result, void* data);
 
+  void connect();
+  void dropProxy();
   void setProxy(GDBusProxy* proxy);
   void claim();
   void report();
@@ -29,6 +31,7 @@ class Orientation {
   std::function<void(int)> _changed;
   GCancellable* _cancellable;
   GDBusProxy* _proxy = nullptr;
+  base::BusReturn _busReturn;
 };
 
 }  // namespace app_assist

@@ -52,7 +52,7 @@ StatusStrip::StatusStrip(Evas_Object* window, Evas_Object* layout)
   waitForNextMinute();
   vconf_notify_key_changed(VCONFKEY_REGIONFORMAT_TIME1224, clockFormatCb, this);
   _networkSignals = std::make_unique<base::SignalSubscription>(
-      base::systemBus(),
+      base::BusKind::System,
       base::SignalSubscription::Match{nullptr, "org.freedesktop.DBus.Properties",
                                       "PropertiesChanged", "/org/freedesktop/NetworkManager"},
       networkSignalCb, this);

@@ -5,9 +5,12 @@
 #include <appfw/AppId.h>
 #include <appfw/AppService.h>
 #include <dlog.h>
+#include <unistd.h>
 #include <vconf.h>
 
+#include <cstdio>
 #include <cstdlib>
+#include <new>
 
 #include "DeviceTheme.h"
 #include "GlibBridge.h"
@@ -22,6 +25,14 @@ namespace app_assist {
 namespace {
 
 WApp* theApp = nullptr;
+
+/// Without memory there is nothing to be done but to say so and to go. Allocates nothing.
+void outOfMemory() {
+  char line[64];
+  const int length = snprintf(line, sizeof line, "F/APP_ASSIST(%5d): out of memory\n", getpid());
+  [[maybe_unused]] const ssize_t written = write(STDERR_FILENO, line, static_cast<size_t>(length));
+  _exit(EXIT_FAILURE);
+}
 
 }  // namespace
 
@@ -75,6 +86,10 @@ void WApp::onAppControl(app_control_h) {}
 /// The name comes first: whoever launches the application waits for it, and requests queue up.
 int WApp::start(int argc, char** argv) {
   theApp = this;
+  std::set_new_handler(outOfMemory);
+  // They tell of clock, locale and power, which the platform does itself, and wait for the system
+  // bus as long as it takes.
+  setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);
   if (!_d->takeName()) return EXIT_FAILURE;
   if (!elm_init(argc, argv)) return EXIT_FAILURE;
   int status = EXIT_FAILURE;

@@ -53,9 +53,9 @@ bool AppService::start(std::function<void()> onNameLost) {
   _object = g_dbus_connection_register_object(_bus.get(), kAppPath, appInterface(), &calls, this,
                                               nullptr, nullptr);
   _nameLost = std::make_unique<base::SignalSubscription>(
-      base::sessionBus(),
+      base::BusKind::Session,
       base::SignalSubscription::Match{"org.freedesktop.DBus", "org.freedesktop.DBus", "NameLost",
-                                      "/org/freedesktop/DBus", name.c_str()},
+                                      "/org/freedesktop/DBus", name},
       nameLostCb, this);
   _named = _object && requestName(_bus.get(), name, replaceExisting | doNotQueue);
   if (!_named) dlog_print(DLOG_ERROR, kTag, "%s is running already", _appId.c_str());

@@ -1,4 +1,5 @@
 #include <appfw/BusNames.h>
+#include <base/Bus.h>
 
 namespace appfw {
 namespace {
@@ -6,13 +7,12 @@ namespace {
 using common::OwnedVariant;
 
 constexpr std::string_view kPrefix = "phoneapp.i";
-constexpr int kBusTimeoutMs = 1000;
 
-/// One question to the bus itself, which always answers at once. Null when it refuses.
-OwnedVariant askBus(GDBusConnection* bus, const char* method, GVariant* arguments) {
-  return OwnedVariant(g_dbus_connection_call_sync(
-      bus, "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", method,
-      arguments, nullptr, G_DBUS_CALL_FLAGS_NONE, kBusTimeoutMs, nullptr, nullptr));
+/// One question to the bus itself. Null when it refuses.
+OwnedVariant askBus(GDBusConnection* bus, const char* method, GVariant* arguments,
+                    std::chrono::milliseconds patience = base::kBusPatience) {
+  return base::ask(bus, {"org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
+                         method, arguments, nullptr, patience});
 }
 
 common::Owned<const char*, g_free> names(GVariant* answer) {
@@ -76,9 +76,12 @@ bool isInstalled(GDBusConnection* bus, const std::string& appId) {
   const std::string name = busName(appId);
   if (name.empty()) return false;
   OwnedVariant owned = askBus(bus, "NameHasOwner", g_variant_new("(s)", name.c_str()));
+  if (!owned) return true;
   gboolean running = FALSE;
-  if (owned) g_variant_get(owned.get(), "(b)", &running);
-  return running || answeredWith(askBus(bus, "ListActivatableNames", nullptr).get(), name);
+  g_variant_get(owned.get(), "(b)", &running);
+  if (running) return true;
+  OwnedVariant activatable = askBus(bus, "ListActivatableNames", nullptr);
+  return !activatable || answeredWith(activatable.get(), name);
 }
 
 Caller findCaller(GDBusConnection* bus, const char* sender) {
@@ -99,7 +102,10 @@ Caller findCaller(GDBusConnection* bus, const char* sender) {
 bool requestName(GDBusConnection* bus, const std::string& name, unsigned flags) {
   constexpr guint32 primaryOwner = 1, inQueue = 2, alreadyOwner = 4;
   if (name.empty()) return false;
-  OwnedVariant answer = askBus(bus, "RequestName", g_variant_new("(su)", name.c_str(), flags));
+  // Asked before there is anything to be seen, and without it there never will be.
+  constexpr std::chrono::seconds patience(5);
+  OwnedVariant answer =
+      askBus(bus, "RequestName", g_variant_new("(su)", name.c_str(), flags), patience);
   guint32 result = 0;
   if (answer) g_variant_get(answer.get(), "(u)", &result);
   return result == primaryOwner || result == inQueue || result == alreadyOwner;

@@ -1,5 +1,6 @@
 #include <app_common.h>
 #include <appfw/AppId.h>
+#include <base/Fault.h>
 #include <base/PhonePaths.h>
 
 #include <cstring>
@@ -22,10 +23,12 @@ int app_get_id(char** id) {
 }
 
 char* app_get_resource_path() {
+  if (base::strikes(__func__)) return nullptr;
   return folder("res/");
 }
 
 char* app_get_shared_resource_path() {
+  if (base::strikes(__func__)) return nullptr;
   return folder("shared/res/");
 }
 

@@ -3,6 +3,7 @@
 #include <app_control_internal.h>
 #include <aul.h>
 
+#include <base/Fault.h>
 #include <cstdlib>
 #include <cstring>
 #include <vector>
@@ -73,6 +74,7 @@ std::string appfw::textOf(const bundle& data, const char* key) {
 }
 
 int app_control_create(app_control_h* app_control) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!app_control) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *app_control = new app_control_s;
   return APP_CONTROL_ERROR_NONE;
@@ -85,6 +87,7 @@ int app_control_destroy(app_control_h app_control) {
 }
 
 int app_control_clone(app_control_h* clone, app_control_h app_control) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!clone || !app_control) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   createFrom(app_control->kind, app_control->data.get(), clone);
   (*clone)->replyTo = app_control->replyTo;
@@ -93,14 +96,17 @@ int app_control_clone(app_control_h* clone, app_control_h app_control) {
 }
 
 int app_control_set_operation(app_control_h app_control, const char* operation) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   return setText(app_control, appfw::kKeyOperation, operation);
 }
 
 int app_control_get_operation(app_control_h app_control, char** operation) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   return getText(app_control, appfw::kKeyOperation, operation);
 }
 
 int app_control_set_uri(app_control_h app_control, const char* uri) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   return setText(app_control, appfw::kKeyUri, uri);
 }
 
@@ -117,6 +123,7 @@ int app_control_get_mime(app_control_h app_control, char** mime) {
 }
 
 int app_control_set_app_id(app_control_h app_control, const char* app_id) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   return setText(app_control, appfw::kKeyAppId, app_id);
 }
 
@@ -125,6 +132,7 @@ int app_control_get_app_id(app_control_h app_control, char** app_id) {
 }
 
 int app_control_set_launch_mode(app_control_h app_control, app_control_launch_mode_e mode) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   switch (mode) {
     case APP_CONTROL_LAUNCH_MODE_SINGLE:
       return setText(app_control, appfw::kKeyLaunchMode, "single");
@@ -142,6 +150,7 @@ int app_control_get_launch_mode(app_control_h app_control, app_control_launch_mo
 }
 
 int app_control_add_extra_data(app_control_h app_control, const char* key, const char* value) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!isText(value)) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   const int error = checkKey(app_control, key);
   return error == APP_CONTROL_ERROR_NONE ? setText(app_control, key, value) : error;
@@ -149,6 +158,7 @@ int app_control_add_extra_data(app_control_h app_control, const char* key, const
 
 int app_control_add_extra_data_array(app_control_h app_control, const char* key,
                                      const char* value[], int length) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   const int error = checkKey(app_control, key);
   if (error != APP_CONTROL_ERROR_NONE) return error;
   if (!value || length < 0) return APP_CONTROL_ERROR_INVALID_PARAMETER;
@@ -163,6 +173,7 @@ int app_control_remove_extra_data(app_control_h app_control, const char* key) {
 }
 
 int app_control_get_extra_data(app_control_h app_control, const char* key, char** value) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!value) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *value = nullptr;
   int error = APP_CONTROL_ERROR_NONE;
@@ -172,6 +183,7 @@ int app_control_get_extra_data(app_control_h app_control, const char* key, char*
 
 int app_control_get_extra_data_array(app_control_h app_control, const char* key, char*** value,
                                      int* length) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!value || !length) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *value = nullptr;
   *length = 0;
@@ -211,6 +223,7 @@ int app_control_foreach_extra_data(app_control_h app_control, app_control_extra_
 }
 
 int app_control_get_caller(app_control_h app_control, char** id) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!id) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *id = nullptr;
   if (!app_control || app_control->kind != app_control_s::Kind::Received) {
@@ -235,6 +248,7 @@ int app_control_import_from_bundle(app_control_h app_control, bundle* data) {
 }
 
 int app_control_export_as_bundle(app_control_h app_control, bundle** data) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!app_control || !data) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *data = bundle_dup(app_control->data.get());
   return APP_CONTROL_ERROR_NONE;

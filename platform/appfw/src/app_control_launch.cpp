@@ -6,6 +6,7 @@
 #include <appfw/BusNames.h>
 #include <appfw/Launch.h>
 #include <base/Bus.h>
+#include <base/Fault.h>
 #include <dlog.h>
 #include <mime_handler.h>
 
@@ -62,6 +63,7 @@ int launch(const std::string& appId, const bundle& request, LaunchEvents events)
 
 int app_control_send_launch_request(app_control_h app_control, app_control_reply_cb callback,
                                     void* user_data) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_LAUNCH_FAILED;
   if (!app_control) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   appfw::OwnedBundle request(bundle_dup(app_control->data.get()));
   request->add(appfw::kKeyOperation, std::string(APP_CONTROL_OPERATION_DEFAULT));
@@ -72,6 +74,7 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 
 int app_control_reply_to_launch_request(app_control_h reply, app_control_h request,
                                         app_control_result_e result) {
+  if (base::strikes(__func__)) return APP_CONTROL_ERROR_LAUNCH_FAILED;
   const bool known = result == APP_CONTROL_RESULT_SUCCEEDED ||
                      result == APP_CONTROL_RESULT_FAILED || result == APP_CONTROL_RESULT_CANCELED;
   if (!reply || !request || request->replyPath.empty() || !known) {

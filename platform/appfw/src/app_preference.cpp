@@ -2,6 +2,7 @@
 #include <appfw/AppId.h>
 #include <appfw/PreferenceStore.h>
 
+#include <base/Fault.h>
 #include <cstring>
 
 namespace {
@@ -14,11 +15,13 @@ appfw::PreferenceStore& ownStore() {
 }  // namespace
 
 int preference_set_string(const char* key, const char* value) {
+  if (base::strikes(__func__)) return PREFERENCE_ERROR_IO_ERROR;
   if (!key || !value) return PREFERENCE_ERROR_INVALID_PARAMETER;
   return ownStore().setText(key, value);
 }
 
 int preference_get_string(const char* key, char** value) {
+  if (base::strikes(__func__)) return PREFERENCE_ERROR_IO_ERROR;
   if (!value) return PREFERENCE_ERROR_INVALID_PARAMETER;
   *value = nullptr;
   if (!key) return PREFERENCE_ERROR_INVALID_PARAMETER;
@@ -30,6 +33,7 @@ int preference_get_string(const char* key, char** value) {
 }
 
 int preference_is_existing(const char* key, bool* existing) {
+  if (base::strikes(__func__)) return PREFERENCE_ERROR_IO_ERROR;
   if (!key || !existing) return PREFERENCE_ERROR_INVALID_PARAMETER;
   std::string text;
   const int error = ownStore().getText(key, text);
@@ -38,6 +42,7 @@ int preference_is_existing(const char* key, bool* existing) {
 }
 
 int preference_remove(const char* key) {
+  if (base::strikes(__func__)) return PREFERENCE_ERROR_IO_ERROR;
   return key ? ownStore().remove(key) : PREFERENCE_ERROR_INVALID_PARAMETER;
 }
 

@@ -2,6 +2,7 @@
 
 #include <appfw/Launch.h>
 #include <aul.h>
+#include <base/Fault.h>
 
 namespace {
 
@@ -23,6 +24,7 @@ int aulResult(int error) {
 }  // namespace
 
 int aul_forward_app(const char* appid, bundle* kb) {
+  if (base::strikes(__func__)) return AUL_R_ECOMM;
   if (!appid || !kb) return AUL_R_EINVAL;
   const std::string caller = appfw::textOf(*kb, AUL_K_CALLER_PID);
   if (caller.empty()) return AUL_R_EINVAL;

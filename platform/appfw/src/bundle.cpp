@@ -1,6 +1,7 @@
 #include "Bundle.h"
 #include "BundleVariant.h"
 
+#include <base/Fault.h>
 #include <algorithm>
 #include <climits>
 #include <cstdlib>
@@ -75,6 +76,7 @@ void _bundle_t::copyFrom(const _bundle_t& other) {
 }
 
 bundle* bundle_create() {
+  if (base::strikes(__func__)) return nullptr;
   set_last_result(BUNDLE_ERROR_NONE);
   return new _bundle_t;
 }
@@ -96,6 +98,7 @@ bundle* bundle_dup(bundle* b_from) {
 }
 
 int bundle_add_str(bundle* b, const char* key, const char* str) {
+  if (base::strikes(__func__)) return BUNDLE_ERROR_OUT_OF_MEMORY;
   if (!b || !isText(key) || !str) return BUNDLE_ERROR_INVALID_PARAMETER;
   return b->add(key, std::string(str)) ? BUNDLE_ERROR_NONE : BUNDLE_ERROR_KEY_EXISTS;
 }

@@ -1,6 +1,6 @@
-#include "Deadline.h"
+#include <base/Deadline.h>
 
-namespace contacts {
+namespace base {
 
 Deadline::Deadline(std::chrono::milliseconds time)
     : _cancellable(g_cancellable_new()), _watch([this, time] {
@@ -19,4 +19,4 @@ Deadline::~Deadline() {
   _watch.join();
 }
 
-}  // namespace contacts
+}  // namespace base

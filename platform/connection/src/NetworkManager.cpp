@@ -3,7 +3,6 @@
 #include <base/Bus.h>
 #include <dlog.h>
 
-#include <algorithm>
 #include <string_view>
 
 namespace {
@@ -14,20 +13,17 @@ using common::OwnedVariant;
 
 constexpr const char* kService = "org.freedesktop.NetworkManager";
 constexpr const char* kPath = "/org/freedesktop/NetworkManager";
-constexpr gint64 kPatienceUs = G_USEC_PER_SEC;
 
-/// The service's objects, read with one patience for all questions together.
 class Objects {
  public:
   /// All properties of one interface; null when there is no answer.
   OwnedVariant properties(const char* path, const char* interface) {
     if (!_bus) return nullptr;
-    const gint64 left = (_deadline - g_get_monotonic_time()) / 1000;
     OwnedError error;
-    OwnedVariant answer(g_dbus_connection_call_sync(
-        _bus.get(), kService, path, "org.freedesktop.DBus.Properties", "GetAll",
-        g_variant_new("(s)", interface), G_VARIANT_TYPE("(a{sv})"), G_DBUS_CALL_FLAGS_NO_AUTO_START,
-        static_cast<int>(std::max<gint64>(left, 1)), nullptr, Out(error)));
+    const OwnedVariant answer = base::ask(_bus.get(),
+                                          {kService, path, "org.freedesktop.DBus.Properties",
+                                           "GetAll", g_variant_new("(s)", interface), "(a{sv})"},
+                                          Out(error));
     if (!answer) {
       if (g_error_matches(error.get(), G_IO_ERROR, G_IO_ERROR_TIMED_OUT)) {
         dlog_print(DLOG_WARN, "CONNECTION", "NetworkManager does not answer");
@@ -39,7 +35,6 @@ class Objects {
 
  private:
   common::OwnedBus _bus = base::systemBus();
-  const gint64 _deadline = g_get_monotonic_time() + kPatienceUs;
 };
 
 std::optional<connection_type_e> typeOfName(std::string_view name) {

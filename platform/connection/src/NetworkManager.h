@@ -5,5 +5,5 @@
 #include <optional>
 
 /// The type of the primary connection as NetworkManager has it; nothing when it does not run or
-/// does not answer within a second.
+/// does not answer.
 std::optional<connection_type_e> typeFromNetworkManager();

@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <net_connection.h>
 
 #include "KernelRoutes.h"
@@ -11,6 +12,7 @@ struct Connection {};
 }  // namespace
 
 int connection_create(connection_h* connection) {
+  if (base::strikes(__func__)) return CONNECTION_ERROR_OUT_OF_MEMORY;
   if (!connection) return CONNECTION_ERROR_INVALID_PARAMETER;
   *connection = new Connection;
   return CONNECTION_ERROR_NONE;
@@ -23,6 +25,7 @@ int connection_destroy(connection_h connection) {
 }
 
 int connection_get_type(connection_h connection, connection_type_e* type) {
+  if (base::strikes(__func__)) return CONNECTION_ERROR_OPERATION_FAILED;
   if (!connection || !type) return CONNECTION_ERROR_INVALID_PARAMETER;
   const auto managed = typeFromNetworkManager();
   *type = managed ? *managed : typeFromKernel("");

@@ -64,7 +64,8 @@ typedef enum {
 /// On the main loop, once for all changes that came while it was busy.
 typedef void (*contacts_db_changed_cb)(const char* view_uri, void* user_data);
 
-/// Counted: the last disconnect closes. Waits for the address book five seconds at the most.
+/// Counted: the last disconnect closes. Waits for the address book a moment at the most; one that
+/// needs longer is a change when it comes.
 int contacts_connect(void);
 /// CONTACTS_ERROR_DB without a connection.
 int contacts_disconnect(void);

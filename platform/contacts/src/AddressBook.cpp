@@ -2,14 +2,27 @@
 
 #include <dlog.h>
 
-#include "Deadline.h"
+#include <utility>
 
 namespace contacts {
-
-using common::Out;
-using common::OwnedError;
+namespace {
 
 constexpr guint kReopenAfterMs = 500;
+constexpr std::chrono::milliseconds kMoment{500};
+
+template <typename Data>
+void connect(EBookClientView* view, const char* signal, GCallback callback, const Data& data) {
+  g_signal_connect_data(
+      view, signal, callback, new Data(data),
+      [](gpointer owned, GClosure*) { delete static_cast<Data*>(owned); },
+      static_cast<GConnectFlags>(0));
+}
+
+std::shared_ptr<EContact> shared(gpointer contact) {
+  return {E_CONTACT(g_object_ref(contact)), g_object_unref};
+}
+
+}  // namespace
 
 AddressBook::AddressBook(std::function<void()> onChange) : _onChange(std::move(onChange)) {}
 
@@ -20,54 +33,56 @@ AddressBook::~AddressBook() {
 }
 
 bool AddressBook::open() {
+  _begin();
+  return !_opening->isOver(kMoment) || _install();
+}
+
+void AddressBook::_begin() {
   _close();
-  _book = openAddressBook();
-  if (!_book) return false;
-  g_signal_connect(_book.get(), "backend-died", G_CALLBACK(_diedCb), this);
-  const Deadline deadline(kPatience);
-  OwnedError error;
-  OwnedContacts contacts;
-  // The watch comes first, so that no change falls between the two.
-  if (_watch(deadline.cancellable(), Out(error))) {
-    contacts = allContacts(_book.get(), deadline.cancellable(), Out(error));
-  }
-  if (error) {
-    dlog_print(DLOG_ERROR, "CONTACTS", "the address book cannot be read: %s", error->message);
-    _close();
-    return false;
-  }
+  auto listener = std::make_shared<Listener>();
+  listener->owner = this;
+  _listener = listener;
+  _opening = AddressBookOpening::begin(
+      [listener](EBookClientView* view) {
+        connect(view, "objects-added", G_CALLBACK(_updatedCb), listener);
+        connect(view, "objects-modified", G_CALLBACK(_updatedCb), listener);
+        connect(view, "objects-removed", G_CALLBACK(_removedCb), listener);
+      },
+      [listener] {
+        if (listener->owner) listener->owner->_late();
+      });
+}
+
+bool AddressBook::_install() {
+  _open = _opening->take();
+  _opening.reset();
+  if (!_open) return false;
+  g_signal_connect(_open.book.get(), "backend-died", G_CALLBACK(_diedCb), this);
   _persons.clear();
-  for (const GSList* item = contacts.get(); item; item = item->next) {
+  for (const GSList* item = _open.contacts.get(); item; item = item->next) {
     _put(static_cast<EContact*>(item->data));
   }
+  _open.contacts.reset();
+  _listener->isOpen = true;
+  for (const auto& news : std::exchange(_listener->early, {})) news();
   return true;
 }
 
-bool AddressBook::_watch(GCancellable* cancellable, GError** error) {
-  OwnedError failure;
-  e_book_client_get_view_sync(_book.get(), everybody(), Out(_view), cancellable, Out(failure));
-  if (!failure) {
-    e_book_client_view_set_flags(_view.get(), E_BOOK_CLIENT_VIEW_FLAGS_NONE, Out(failure));
+void AddressBook::_late() {
+  if (!_opening) return;
+  if (_install()) {
+    _changed();
+  } else {
+    _reopenLater();
   }
-  if (!failure) {
-    g_signal_connect(_view.get(), "objects-added", G_CALLBACK(_updatedCb), this);
-    g_signal_connect(_view.get(), "objects-modified", G_CALLBACK(_updatedCb), this);
-    g_signal_connect(_view.get(), "objects-removed", G_CALLBACK(_removedCb), this);
-    e_book_client_view_start(_view.get(), Out(failure));
-  }
-  if (!failure) return true;
-  g_propagate_error(error, failure.release());
-  return false;
 }
 
 void AddressBook::_close() {
-  if (_view) {
-    g_signal_handlers_disconnect_by_data(_view.get(), this);
-    e_book_client_view_stop(_view.get(), nullptr);
-  }
-  if (_book) g_signal_handlers_disconnect_by_data(_book.get(), this);
-  _view.reset();
-  _book.reset();
+  if (_listener) _listener->owner = nullptr;
+  if (_open.book) g_signal_handlers_disconnect_by_data(_open.book.get(), this);
+  _listener.reset();
+  _opening.reset();
+  _open = {};
 }
 
 void AddressBook::_put(EContact* contact) {
@@ -79,20 +94,31 @@ void AddressBook::_put(EContact* contact) {
   person.id = id;
 }
 
-void AddressBook::_updatedCb(EBookClientView*, const GSList* contacts, gpointer data) {
-  auto* self = static_cast<AddressBook*>(data);
-  for (const GSList* item = contacts; item; item = item->next) {
-    self->_put(static_cast<EContact*>(item->data));
+void AddressBook::Listener::hear(std::function<void()> news) {
+  if (!owner) return;
+  if (!isOpen) {
+    early.push_back(std::move(news));
+    return;
   }
-  self->_changed();
+  news();
+  owner->_changed();
+}
+
+void AddressBook::_updatedCb(EBookClientView*, const GSList* contacts, gpointer data) {
+  const auto listener = *static_cast<std::shared_ptr<Listener>*>(data);
+  for (const GSList* item = contacts; item; item = item->next) {
+    listener->hear(
+        [self = listener->owner, contact = shared(item->data)] { self->_put(contact.get()); });
+  }
 }
 
 void AddressBook::_removedCb(EBookClientView*, const GSList* uids, gpointer data) {
-  auto* self = static_cast<AddressBook*>(data);
+  const auto listener = *static_cast<std::shared_ptr<Listener>*>(data);
   for (const GSList* item = uids; item; item = item->next) {
-    self->_persons.erase(static_cast<const char*>(item->data));
+    listener->hear([self = listener->owner, uid = std::string(static_cast<char*>(item->data))] {
+      self->_persons.erase(uid);
+    });
   }
-  self->_changed();
 }
 
 void AddressBook::_changed() {
@@ -108,15 +134,18 @@ gboolean AddressBook::_tellCb(gpointer data) {
 
 /// The service that holds the address book crashed; it is started again by being asked.
 void AddressBook::_diedCb(EClient*, gpointer data) {
-  auto* self = static_cast<AddressBook*>(data);
   dlog_print(DLOG_ERROR, "CONTACTS", "the address book went away");
-  if (!self->_reopening) self->_reopening = g_timeout_add(kReopenAfterMs, _reopenCb, self);
+  static_cast<AddressBook*>(data)->_reopenLater();
+}
+
+void AddressBook::_reopenLater() {
+  if (!_reopening) _reopening = g_timeout_add(kReopenAfterMs, _reopenCb, this);
 }
 
 gboolean AddressBook::_reopenCb(gpointer data) {
   auto* self = static_cast<AddressBook*>(data);
   self->_reopening = 0;
-  if (self->open()) self->_changed();
+  self->_begin();
   return G_SOURCE_REMOVE;
 }
 

@@ -4,10 +4,11 @@
 
 #include <functional>
 #include <map>
+#include <memory>
 #include <string>
 #include <vector>
 
-#include "BookConnection.h"
+#include "AddressBookOpening.h"
 #include "Person.h"
 
 namespace contacts {
@@ -20,29 +21,41 @@ class AddressBook {
   AddressBook(const AddressBook&) = delete;
   AddressBook& operator=(const AddressBook&) = delete;
 
-  /// False, with a log line, when the address book cannot be reached.
+  /// Waits a moment for the address book; one that needs longer comes later, which is a change.
+  /// False, with a log line, when there is none.
   bool open();
 
   /// By the address book's own ids.
   const std::map<std::string, Person>& persons() const { return _persons; }
 
  private:
-  static void _updatedCb(EBookClientView*, const GSList* contacts, gpointer self);
-  static void _removedCb(EBookClientView*, const GSList* uids, gpointer self);
+  /// Where the address book's notifications arrive, until it is closed.
+  struct Listener {
+    AddressBook* owner;
+    std::vector<std::function<void()>> early;  ///< came before the index that they change
+    bool isOpen = false;
+
+    void hear(std::function<void()> news);
+  };
+
+  static void _updatedCb(EBookClientView*, const GSList* contacts, gpointer listener);
+  static void _removedCb(EBookClientView*, const GSList* uids, gpointer listener);
   static void _diedCb(EClient*, gpointer self);
   static gboolean _tellCb(gpointer self);
   static gboolean _reopenCb(gpointer self);
 
-  bool _watch(GCancellable* cancellable, GError** error);
+  void _begin();
+  bool _install();
+  void _late();
   void _close();
+  void _reopenLater();
   void _put(EContact* contact);
   void _changed();
 
-  using OwnedView = common::Owned<EBookClientView, g_object_unref>;
-
   const std::function<void()> _onChange;
-  OwnedBook _book;
-  OwnedView _view;
+  std::shared_ptr<AddressBookOpening> _opening;
+  std::shared_ptr<Listener> _listener;
+  OpenBook _open;
   std::map<std::string, Person> _persons;
   int _lastId = 0;
   guint _telling = 0;

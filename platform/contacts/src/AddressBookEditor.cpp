@@ -1,7 +1,8 @@
 #include <contacts/AddressBookEditor.h>
 
+#include <base/Deadline.h>
+
 #include "BookConnection.h"
-#include "Deadline.h"
 #include "Person.h"
 
 namespace contacts {
@@ -54,7 +55,7 @@ bool fail(const OwnedError& failure, std::string& error) {
 }
 
 bool store(EBookClient* book, GSList* contacts, std::string& error) {
-  const Deadline deadline(kPatience);
+  const base::Deadline deadline(kPatience);
   OwnedError failure;
   e_book_client_add_contacts_sync(book, contacts, E_BOOK_OPERATION_FLAG_NONE, nullptr,
                                   deadline.cancellable(), Out(failure));
@@ -63,7 +64,7 @@ bool store(EBookClient* book, GSList* contacts, std::string& error) {
 
 /// The contacts of exactly that name.
 OwnedContacts named(EBookClient* book, const std::string& name, std::string& error) {
-  const Deadline deadline(kPatience);
+  const base::Deadline deadline(kPatience);
   OwnedError failure;
   OwnedContacts found;
   const OwnedContacts contacts = allContacts(book, deadline.cancellable(), Out(failure));
@@ -128,7 +129,7 @@ bool AddressBookEditor::rename(const std::string& from, const std::string& to, s
     e_vcard_remove_attributes(E_VCARD(contact), nullptr, EVC_N);
     e_contact_set(contact, E_CONTACT_FULL_NAME, to.c_str());
   }
-  const Deadline deadline(kPatience);
+  const base::Deadline deadline(kPatience);
   OwnedError failure;
   e_book_client_modify_contacts_sync(_d->book.get(), contacts.get(), E_BOOK_OPERATION_FLAG_NONE,
                                      deadline.cancellable(), Out(failure));
@@ -144,7 +145,7 @@ bool AddressBookEditor::remove(const std::string& name, std::string& error) {
         e_contact_get_const(static_cast<EContact*>(item->data), E_CONTACT_UID));
     uids.reset(g_slist_prepend(uids.release(), uid));
   }
-  const Deadline deadline(kPatience);
+  const base::Deadline deadline(kPatience);
   OwnedError failure;
   e_book_client_remove_contacts_sync(_d->book.get(), uids.get(), E_BOOK_OPERATION_FLAG_NONE,
                                      deadline.cancellable(), Out(failure));
@@ -152,7 +153,7 @@ bool AddressBookEditor::remove(const std::string& name, std::string& error) {
 }
 
 std::vector<AddressBookEditor::Entry> AddressBookEditor::all() {
-  const Deadline deadline(kPatience);
+  const base::Deadline deadline(kPatience);
   const OwnedContacts contacts = allContacts(_d->book.get(), deadline.cancellable(), nullptr);
   std::vector<Entry> entries;
   for (const GSList* item = contacts.get(); item; item = item->next) {

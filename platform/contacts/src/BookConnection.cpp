@@ -1,8 +1,7 @@
 #include "BookConnection.h"
 
+#include <base/Deadline.h>
 #include <dlog.h>
-
-#include "Deadline.h"
 
 namespace contacts {
 
@@ -13,7 +12,7 @@ using common::OwnedError;
 constexpr guint32 kDoNotWaitForOnline = static_cast<guint32>(-1);
 
 OwnedBook openAddressBook() {
-  const Deadline deadline(kPatience);
+  const base::Deadline deadline(kPatience);
   OwnedError error;
   const Owned<ESourceRegistry, g_object_unref> registry(
       e_source_registry_new_sync(deadline.cancellable(), Out(error)));

@@ -11,6 +11,7 @@ namespace contacts {
 constexpr std::chrono::milliseconds kPatience{5000};
 
 using OwnedBook = common::Owned<EBookClient, g_object_unref>;
+using OwnedView = common::Owned<EBookClientView, g_object_unref>;
 using OwnedContact = common::Owned<EContact, g_object_unref>;
 
 inline void freeContacts(GSList* contacts) {

@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <common/Owned.h>
 #include <contacts.h>
 
@@ -136,6 +137,7 @@ int answer(Records records, int offset, int limit, contacts_list_h* list) {
 }  // namespace
 
 int contacts_connect(void) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_IPC_NOT_AVALIABLE;
   Connection& current = connection();
   if (current.users == 0) {
     auto book = std::make_unique<AddressBook>(tellAll);
@@ -147,6 +149,7 @@ int contacts_connect(void) {
 }
 
 int contacts_disconnect(void) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_DB;
   Connection& current = connection();
   if (current.users == 0) return CONTACTS_ERROR_DB;
   if (--current.users == 0) {
@@ -158,6 +161,7 @@ int contacts_disconnect(void) {
 
 int contacts_db_add_changed_cb(const char* view_uri, contacts_db_changed_cb callback,
                                void* user_data) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_DB;
   const auto view = contacts::viewOf(view_uri);
   if (!view || !callback) return CONTACTS_ERROR_INVALID_PARAMETER;
   if (!connection().book) return CONTACTS_ERROR_DB;
@@ -167,6 +171,7 @@ int contacts_db_add_changed_cb(const char* view_uri, contacts_db_changed_cb call
 
 int contacts_db_remove_changed_cb(const char* view_uri, contacts_db_changed_cb callback,
                                   void* user_data) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_NO_DATA;
   const auto view = contacts::viewOf(view_uri);
   if (!view || !callback) return CONTACTS_ERROR_INVALID_PARAMETER;
   auto& callbacks = connection().callbacks;
@@ -179,6 +184,7 @@ int contacts_db_remove_changed_cb(const char* view_uri, contacts_db_changed_cb c
 
 int contacts_db_get_records_with_query(contacts_query_h query, int offset, int limit,
                                        contacts_list_h* record_list) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_DB;
   if (!query || !record_list || offset < 0 || limit < 0) return CONTACTS_ERROR_INVALID_PARAMETER;
   *record_list = nullptr;
   if (!connection().book) return CONTACTS_ERROR_DB;

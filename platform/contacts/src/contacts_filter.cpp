@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <common/Owned.h>
 #include <contacts.h>
 
@@ -73,6 +74,7 @@ bool contacts_filter_s::matches(const contacts_record_s& record) const {
 }
 
 int contacts_filter_create(const char* view_uri, contacts_filter_h* filter) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_OUT_OF_MEMORY;
   const auto view = contacts::viewOf(view_uri);
   if (!filter || !view) return CONTACTS_ERROR_INVALID_PARAMETER;
   *filter = new contacts_filter_s{*view};
@@ -87,6 +89,7 @@ int contacts_filter_destroy(contacts_filter_h filter) {
 
 int contacts_filter_add_str(contacts_filter_h filter, unsigned int property_id,
                             contacts_match_str_flag_e match, const char* match_value) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_OUT_OF_MEMORY;
   const bool known = match >= CONTACTS_MATCH_EXACTLY && match <= CONTACTS_MATCH_EXISTS;
   const bool valid =
       match == CONTACTS_MATCH_EXISTS || (match_value && g_utf8_validate(match_value, -1, nullptr));

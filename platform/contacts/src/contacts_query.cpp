@@ -1,8 +1,10 @@
+#include <base/Fault.h>
 #include <contacts.h>
 
 #include "Filter.h"
 
 int contacts_query_create(const char* view_uri, contacts_query_h* query) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_OUT_OF_MEMORY;
   const auto view = contacts::viewOf(view_uri);
   if (!query || !view) return CONTACTS_ERROR_INVALID_PARAMETER;
   *query = new contacts_query_s{*view, std::nullopt, {}, std::nullopt};
@@ -16,6 +18,7 @@ int contacts_query_destroy(contacts_query_h query) {
 }
 
 int contacts_query_set_filter(contacts_query_h query, contacts_filter_h filter) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_OUT_OF_MEMORY;
   if (!query || !filter || filter->view != query->view || filter->expectsCondition) {
     return CONTACTS_ERROR_INVALID_PARAMETER;
   }

@@ -1,5 +1,6 @@
 #include <contacts.h>
 
+#include <base/Fault.h>
 #include <cstring>
 
 #include "Record.h"
@@ -58,6 +59,7 @@ int contacts_list_last(contacts_list_h list) {
 }
 
 int contacts_list_next(contacts_list_h list) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_NO_DATA;
   return moveTo(list, list ? list->current + 1 : 0);
 }
 
@@ -67,6 +69,7 @@ int contacts_list_prev(contacts_list_h list) {
 }
 
 int contacts_list_get_current_record_p(contacts_list_h list, contacts_record_h* record) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_NO_DATA;
   if (!list || !record) return CONTACTS_ERROR_INVALID_PARAMETER;
   *record = nullptr;
   if (list->current >= list->records.size()) return CONTACTS_ERROR_NO_DATA;
@@ -84,6 +87,7 @@ int contacts_list_destroy(contacts_list_h list, bool delete_child) {
 }
 
 int contacts_record_get_str_p(contacts_record_h record, unsigned int property_id, char** value) {
+  if (base::strikes(__func__)) return CONTACTS_ERROR_NO_DATA;
   if (!record || !value) return CONTACTS_ERROR_INVALID_PARAMETER;
   *value = nullptr;
   if (!isTextProperty(property_id)) return CONTACTS_ERROR_INVALID_PARAMETER;

@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <base/PhonePaths.h>
 #include <media_content.h>
 
@@ -84,17 +85,20 @@ int copyText(media_info_h media, char** text, const std::string& value) {
 }  // namespace
 
 int media_content_connect(void) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_DB_FAILED;
   connections++;
   return MEDIA_CONTENT_ERROR_NONE;
 }
 
 int media_content_disconnect(void) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_DB_FAILED;
   if (connections == 0) return MEDIA_CONTENT_ERROR_INVALID_OPERATION;
   connections--;
   return MEDIA_CONTENT_ERROR_NONE;
 }
 
 int media_filter_create(filter_h* filter) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_OUT_OF_MEMORY;
   if (!filter) return MEDIA_CONTENT_ERROR_INVALID_PARAMETER;
   *filter = new (std::nothrow) filter_s;
   return *filter ? MEDIA_CONTENT_ERROR_NONE : MEDIA_CONTENT_ERROR_OUT_OF_MEMORY;
@@ -109,6 +113,7 @@ int media_filter_destroy(filter_h filter) {
 // A path names one file, so the collation has nothing to choose from.
 int media_filter_set_condition(filter_h filter, const char* condition,
                                media_content_collation_e /*collate_type*/) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_OUT_OF_MEMORY;
   if (!filter || !condition) return MEDIA_CONTENT_ERROR_INVALID_PARAMETER;
   auto path = pathOfCondition(condition);
   if (!path) return MEDIA_CONTENT_ERROR_INVALID_PARAMETER;
@@ -117,6 +122,7 @@ int media_filter_set_condition(filter_h filter, const char* condition,
 }
 
 int media_info_foreach_media_from_db(filter_h filter, media_info_cb callback, void* user_data) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_DB_FAILED;
   if (!callback) return MEDIA_CONTENT_ERROR_INVALID_PARAMETER;
   if (connections == 0) return MEDIA_CONTENT_ERROR_DB_FAILED;
   if (filter) {
@@ -128,6 +134,7 @@ int media_info_foreach_media_from_db(filter_h filter, media_info_cb callback, vo
 }
 
 int media_info_clone(media_info_h* dst, media_info_h src) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_OUT_OF_MEMORY;
   if (!dst || !src) return MEDIA_CONTENT_ERROR_INVALID_PARAMETER;
   *dst = new (std::nothrow) media_info_s(*src);
   return *dst ? MEDIA_CONTENT_ERROR_NONE : MEDIA_CONTENT_ERROR_OUT_OF_MEMORY;
@@ -140,6 +147,7 @@ int media_info_destroy(media_info_h media) {
 }
 
 int media_info_get_thumbnail_path(media_info_h media, char** path) {
+  if (base::strikes(__func__)) return MEDIA_CONTENT_ERROR_OUT_OF_MEMORY;
   return copyText(media, path, media ? media->record.thumbnail : std::string());
 }
 

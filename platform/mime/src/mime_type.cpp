@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <common/Owned.h>
 #include <mime_type.h>
 
@@ -40,6 +41,7 @@ OwnedText typeOf(const char* extension) {
 }  // namespace
 
 int mime_type_get_mime_type(const char* file_extension, char** mime_type) {
+  if (base::strikes(__func__)) return MIME_TYPE_ERROR_OUT_OF_MEMORY;
   if (!file_extension || !mime_type) return MIME_TYPE_ERROR_INVALID_PARAMETER;
   const OwnedText type = typeOf(file_extension);
   *mime_type = strdup(type ? type.get() : "application/octet-stream");

@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <notification_status.h>
 
 #include <base/Bus.h>
@@ -27,6 +28,7 @@ void shownCb(GObject* bus, GAsyncResult* result, void*) {
 }  // namespace
 
 int notification_status_message_post(const char* message) {
+  if (base::strikes(__func__)) return NOTIFICATION_ERROR_FROM_DBUS;
   if (!message || !*message) return NOTIFICATION_ERROR_INVALID_PARAMETER;
   common::OwnedBus bus = base::sessionBus();
   if (!bus) return NOTIFICATION_ERROR_FROM_DBUS;

@@ -18,7 +18,7 @@ using OnOpen = std::function<void()>;
 class OpenActions {
  public:
   OpenActions()
-      : _signals(base::sessionBus(), {kService, kService, nullptr, kPath}, signalCb, this) {}
+      : _signals(base::BusKind::Session, {kService, kService, nullptr, kPath}, signalCb, this) {}
 
   void add(unsigned number, OnOpen onOpen) { _actions[number] = std::move(onOpen); }
 

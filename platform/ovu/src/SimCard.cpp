@@ -8,15 +8,12 @@ namespace {
 constexpr const char* kService = "org.freedesktop.ModemManager1";
 constexpr const char* kModem = "org.freedesktop.ModemManager1.Modem";
 constexpr const char* kSim = "org.freedesktop.ModemManager1.Sim";
-constexpr int kTimeoutMs = 1000;
 
 using common::OwnedVariant;
 
 OwnedVariant call(GDBusConnection* bus, const char* path, const char* interface, const char* method,
                   GVariant* arguments, const char* replyType) {
-  return OwnedVariant(g_dbus_connection_call_sync(
-      bus, kService, path, interface, method, arguments, G_VARIANT_TYPE(replyType),
-      G_DBUS_CALL_FLAGS_NO_AUTO_START, kTimeoutMs, nullptr, nullptr));
+  return base::ask(bus, {kService, path, interface, method, arguments, replyType});
 }
 
 std::string firstSimPath(GVariant* objects) {

@@ -1,5 +1,6 @@
 #include <ovu.h>
 
+#include <base/Fault.h>
 #include <cstring>
 #include <new>
 #include <string>
@@ -12,6 +13,7 @@ struct ovu_handle_s {
 };
 
 int ovu_open_handle(ovu_h* handle) {
+  if (base::strikes(__func__)) return OVU_ERROR_STORE;
   if (!handle) return OVU_ERROR_INVALID_PARAMETER;
   *handle = nullptr;
   auto* opened = new (std::nothrow) ovu_handle_s;
@@ -24,6 +26,7 @@ int ovu_open_handle(ovu_h* handle) {
 }
 
 int ovu_check_account_exist(ovu_h handle, char** imsi, char** msisdn) {
+  if (base::strikes(__func__)) return OVU_ERROR_STORE;
   if (!handle || !imsi) return OVU_ERROR_INVALID_PARAMETER;
   *imsi = nullptr;
   if (msisdn) *msisdn = nullptr;
@@ -37,6 +40,7 @@ int ovu_check_account_exist(ovu_h handle, char** imsi, char** msisdn) {
 }
 
 int ovu_set_imsi(ovu_h handle, const char* imsi) {
+  if (base::strikes(__func__)) return OVU_ERROR_STORE;
   if (!handle || !imsi) return OVU_ERROR_INVALID_PARAMETER;
   bool failed = false;
   const auto account = handle->store.account(&failed);
@@ -48,6 +52,7 @@ int ovu_set_imsi(ovu_h handle, const char* imsi) {
 
 // The store is the only source on this phone, so `cached` makes no difference.
 int ovu_get_service_status(ovu_h handle, const char* service, char** status, int /*cached*/) {
+  if (base::strikes(__func__)) return OVU_ERROR_STORE;
   if (!handle || !service || !status) return OVU_ERROR_INVALID_PARAMETER;
   *status = nullptr;
   if (handle->imsi.empty()) return OVU_ERROR_NO_ACCOUNT;

@@ -37,11 +37,10 @@ void setZone(const std::string& zone) {
 
 TimeZoneWatch::TimeZoneWatch(std::function<void()> onChanged)
     : _onChanged(std::move(onChanged)),
-      _bus(base::systemBus()),
-      _subscription(base::systemBus(),
-                    {kService, kProperties, "PropertiesChanged", kPath, kService}, changedCb,
-                    this) {
-  if (_bus) ask();
+      _subscription(base::BusKind::System,
+                    {kService, kProperties, "PropertiesChanged", kPath, kService}, changedCb, this),
+      _busReturn(base::BusKind::System, [this] { ask(); }) {
+  ask();
 }
 
 TimeZoneWatch::~TimeZoneWatch() {
@@ -67,7 +66,9 @@ void TimeZoneWatch::changedCb(GDBusConnection*, const char*, const char*, const 
 }
 
 void TimeZoneWatch::ask() {
-  g_dbus_connection_call(_bus.get(), kService, kPath, kProperties, "Get",
+  const common::OwnedBus bus = base::systemBus();
+  if (!bus) return;
+  g_dbus_connection_call(bus.get(), kService, kPath, kProperties, "Get",
                          g_variant_new("(ss)", kService, kZone), G_VARIANT_TYPE("(v)"),
                          G_DBUS_CALL_FLAGS_NO_AUTO_START, -1, _asking.get(), answeredCb, this);
 }

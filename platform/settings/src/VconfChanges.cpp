@@ -23,8 +23,8 @@ void VconfChanges::announce(const std::string& key) {
 void VconfChanges::add(const std::string& key, vconf_callback_fn callback, void* data) {
   if (!_subscription) {
     _subscription = std::make_unique<base::SignalSubscription>(
-        base::sessionBus(), base::SignalSubscription::Match{nullptr, kInterface, kSignal, kPath},
-        changedCb, this);
+        base::BusKind::Session,
+        base::SignalSubscription::Match{nullptr, kInterface, kSignal, kPath}, changedCb, this);
   }
   _listeners.push_back(std::make_shared<Listener>(Listener{key, callback, data}));
 }

@@ -3,6 +3,7 @@
 #include "ClockWatch.h"
 #include "TimeZoneWatch.h"
 
+#include <base/Fault.h>
 #include <vconf.h>
 
 #include <cstdlib>
@@ -105,6 +106,7 @@ std::string localeOf(system_settings_key_e key) {
 
 int system_settings_set_changed_cb(system_settings_key_e key, system_settings_changed_cb callback,
                                    void* user_data) {
+  if (base::strikes(__func__)) return SYSTEM_SETTINGS_ERROR_IO_ERROR;
   if (!callback) return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
   const char* stored = vconfKey(key);
   if (!stored && !isTime(key)) return SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED;
@@ -115,6 +117,7 @@ int system_settings_set_changed_cb(system_settings_key_e key, system_settings_ch
 }
 
 int system_settings_unset_changed_cb(system_settings_key_e key) {
+  if (base::strikes(__func__)) return SYSTEM_SETTINGS_ERROR_IO_ERROR;
   const char* stored = vconfKey(key);
   if (!stored && !isTime(key)) return SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED;
   const bool listened = listeners().erase(key) > 0;

@@ -2,6 +2,7 @@
 
 #include "VconfChanges.h"
 
+#include <base/Fault.h>
 #include <base/KeyValueStore.h>
 #include <base/PhonePaths.h>
 #include <dlog.h>
@@ -47,12 +48,14 @@ int set(const char* key, const Store::Value& value) {
 }  // namespace
 
 char* vconf_get_str(const char* in_key) {
+  if (base::strikes(__func__)) return nullptr;
   Store::Value value;
   const auto* text = get<std::string>(in_key, value);
   return text ? strdup(text->c_str()) : nullptr;
 }
 
 int vconf_get_int(const char* in_key, int* intval) {
+  if (base::strikes(__func__)) return VCONF_ERROR;
   Store::Value value;
   const auto* number = intval ? get<int64_t>(in_key, value) : nullptr;
   if (!number || *number < INT_MIN || *number > INT_MAX) return VCONF_ERROR;
@@ -80,12 +83,14 @@ int vconf_set_bool(const char* in_key, int boolval) {
 }
 
 int vconf_notify_key_changed(const char* in_key, vconf_callback_fn cb, void* user_data) {
+  if (base::strikes(__func__)) return VCONF_ERROR;
   if (!isKey(in_key) || !cb) return VCONF_ERROR;
   changes().add(in_key, cb, user_data);
   return VCONF_OK;
 }
 
 int vconf_ignore_key_changed(const char* in_key, vconf_callback_fn cb) {
+  if (base::strikes(__func__)) return VCONF_ERROR;
   if (!isKey(in_key) || !cb) return VCONF_ERROR;
   return changes().remove(in_key, cb) ? VCONF_OK : VCONF_ERROR;
 }

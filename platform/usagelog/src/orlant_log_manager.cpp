@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <base/PhonePaths.h>
 #include <glib.h>
 #include <orlant_log_manager.h>
@@ -53,6 +54,7 @@ struct orlant_log_manager_s {
 };
 
 int orlant_log_manager_create(orlant_log_manager_h* handle) {
+  if (base::strikes(__func__)) return ORLANT_LOG_ERROR_STORE;
   if (!handle) return ORLANT_LOG_ERROR_INVALID_PARAMETER;
   *handle = nullptr;
   auto database = common::Database::open(base::databaseFolder() + "/usagelog.db", kSchema);
@@ -64,6 +66,7 @@ int orlant_log_manager_create(orlant_log_manager_h* handle) {
 int orlant_log_manager_insert(orlant_log_manager_h handle, const char* content_uri, bundle* data,
                               orlant_log_manager_reply_cb callback, void* user_data,
                               int* request_id) {
+  if (base::strikes(__func__)) return ORLANT_LOG_ERROR_STORE;
   if (!handle || !content_uri || !data) return ORLANT_LOG_ERROR_INVALID_PARAMETER;
   const int request = ++handle->lastRequest;
   if (request_id) *request_id = request;

@@ -1,3 +1,5 @@
+#include <base/Fault.h>
+
 #include <memory>
 #include <string>
 
@@ -50,6 +52,7 @@ class Recall {
 }  // namespace
 
 int zelqo_recall_upload(unsigned int request_id, zelqo_recall_cb callback, void* user_data) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_STORE;
   if (!callback) return ZELQO_ERROR_INVALID_PARAMETER;
   zelqo::Store& store = zelqo::ShareBook::instance().store();
   const auto share = store.sent(request_id);

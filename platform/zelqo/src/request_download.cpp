@@ -1,3 +1,4 @@
+#include <base/Fault.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -23,6 +24,7 @@ std::string withoutTrailingSlash(std::string folder) {
 
 int zelqo_request_download(const char** urls, unsigned int count, const char* folder, int priority,
                            int flags, zelqo_download_cb callback, void* user_data) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_STORE;
   if (!urls || count == 0 || priority < 0 || flags != 0 || !callback) {
     return ZELQO_ERROR_INVALID_PARAMETER;
   }

@@ -1,4 +1,6 @@
 // The calls that answer from the store.
+#include <base/Fault.h>
+
 #include <cstdlib>
 #include <cstring>
 #include <limits>
@@ -43,6 +45,7 @@ int giveFileText(zelqo_share_h handle, unsigned int index, Text member, bool isA
 }  // namespace
 
 int zelqo_push_info_get_handle(const char* contents_token, zelqo_share_h* handle) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_STORE;
   if (!handle) return ZELQO_ERROR_INVALID_PARAMETER;
   *handle = nullptr;
   if (!contents_token || !*contents_token) return ZELQO_ERROR_INVALID_PARAMETER;
@@ -50,6 +53,7 @@ int zelqo_push_info_get_handle(const char* contents_token, zelqo_share_h* handle
 }
 
 int zelqo_push_info_get_sender_msisdn(zelqo_share_h handle, char** msisdn) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (!msisdn) return ZELQO_ERROR_INVALID_PARAMETER;
   *msisdn = nullptr;
   const ReceivedHandle* share = received(handle);
@@ -60,6 +64,7 @@ int zelqo_push_info_get_sender_msisdn(zelqo_share_h handle, char** msisdn) {
 }
 
 int zelqo_push_info_get_content_info_count(zelqo_share_h handle, unsigned int* count) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (!count) return ZELQO_ERROR_INVALID_PARAMETER;
   *count = 0;
   const ReceivedHandle* share = received(handle);
@@ -69,6 +74,7 @@ int zelqo_push_info_get_content_info_count(zelqo_share_h handle, unsigned int* c
 }
 
 int zelqo_push_info_get_expired_time(zelqo_share_h handle, unsigned long long* expired_time) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (!expired_time) return ZELQO_ERROR_INVALID_PARAMETER;
   *expired_time = 0;
   const ReceivedHandle* share = received(handle);
@@ -78,6 +84,7 @@ int zelqo_push_info_get_expired_time(zelqo_share_h handle, unsigned long long* e
 }
 
 int zelqo_content_info_get_file_size(zelqo_share_h handle, unsigned int index, unsigned int* size) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (!size) return ZELQO_ERROR_INVALID_PARAMETER;
   *size = 0;
   ReceivedHandle* share = received(handle);
@@ -91,30 +98,37 @@ int zelqo_content_info_get_file_size(zelqo_share_h handle, unsigned int index, u
 }
 
 int zelqo_content_info_get_file_name(zelqo_share_h handle, unsigned int index, char** name) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   return giveFileText(handle, index, &ReceivedFile::name, false, name);
 }
 
 int zelqo_content_info_get_content_type(zelqo_share_h handle, unsigned int index, char** type) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   return giveFileText(handle, index, &ReceivedFile::type, false, type);
 }
 
 int zelqo_content_info_get_thumbnail_url(zelqo_share_h handle, unsigned int index, char** url) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   return giveFileText(handle, index, &ReceivedFile::thumb, true, url);
 }
 
 int zelqo_content_info_get_mid_thumbnail_url(zelqo_share_h handle, unsigned int index, char** url) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   return giveFileText(handle, index, &ReceivedFile::mid, true, url);
 }
 
 int zelqo_content_info_get_big_thumbnail_url(zelqo_share_h handle, unsigned int index, char** url) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   return giveFileText(handle, index, &ReceivedFile::big, true, url);
 }
 
 int zelqo_content_info_get_download_url(zelqo_share_h handle, unsigned int index, char** url) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   return giveFileText(handle, index, &ReceivedFile::url, true, url);
 }
 
 int zelqo_upload_info_get_handle(int request_id, zelqo_share_h* handle) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_STORE;
   if (!handle) return ZELQO_ERROR_INVALID_PARAMETER;
   *handle = nullptr;
   return ShareBook::instance().openSent(request_id, *handle);
@@ -122,6 +136,7 @@ int zelqo_upload_info_get_handle(int request_id, zelqo_share_h* handle) {
 
 int zelqo_upload_info_get_recipient_msisdn_list(zelqo_share_h handle, zelqo_recipient_s*** list,
                                                 unsigned int* count) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (list) *list = nullptr;
   if (count) *count = 0;
   SentHandle* share = list && count ? sent(handle) : nullptr;
@@ -132,6 +147,7 @@ int zelqo_upload_info_get_recipient_msisdn_list(zelqo_share_h handle, zelqo_reci
 }
 
 int zelqo_upload_info_get_content_info_count(zelqo_share_h handle, unsigned int* count) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (!count) return ZELQO_ERROR_INVALID_PARAMETER;
   *count = 0;
   const SentHandle* share = sent(handle);
@@ -141,6 +157,7 @@ int zelqo_upload_info_get_content_info_count(zelqo_share_h handle, unsigned int*
 }
 
 int zelqo_upload_info_get_content_file_path(zelqo_share_h handle, unsigned int index, char** path) {
+  if (base::strikes(__func__)) return ZELQO_ERROR_NO_DATA;
   if (!path) return ZELQO_ERROR_INVALID_PARAMETER;
   *path = nullptr;
   const SentHandle* share = sent(handle);

@@ -17,6 +17,20 @@ std::string& rootFolder() {
   return folder;
 }
 
+GPid& busProcess() {
+  static GPid process = 0;
+  return process;
+}
+
+std::string busConfig() {
+  return rootFolder() + "/bus.conf";
+}
+
+void endBus() {
+  kill(busProcess(), SIGKILL);
+  waitpid(busProcess(), nullptr, 0);
+}
+
 /// Starts a bus that ends with this program, and makes it the session and the system bus.
 GPid startBus(const std::string& config) {
   const std::string file = "--config-file=" + config;
@@ -51,24 +65,31 @@ TestPhone::TestPhone() {
 
 void TestPhone::SetUp() {
   const std::string services = root() + "/services";
-  const std::string config = root() + "/bus.conf";
   g_mkdir_with_parents(services.c_str(), 0755);
-  writeFile(config,
+  writeFile(busConfig(),
             "<busconfig><type>session</type><listen>unix:path=" + root() +
                 "/bus</listen><auth>EXTERNAL</auth><servicedir>" + services +
                 "</servicedir><policy context=\"default\"><allow user=\"*\"/><allow own=\"*\"/>"
                 "<allow send_destination=\"*\" eavesdrop=\"true\"/><allow "
                 "eavesdrop=\"true\"/></policy></busconfig>");
-  _bus = startBus(config);
+  busProcess() = startBus(busConfig());
   for (const auto& bus : {base::sessionBus().release(), base::systemBus().release()}) {
     g_dbus_connection_set_exit_on_close(bus, FALSE);
   }
 }
 
 void TestPhone::TearDown() {
-  kill(_bus, SIGTERM);
-  waitpid(_bus, nullptr, 0);
+  endBus();
   std::filesystem::remove_all(root());
+}
+
+GPid TestPhone::bus() {
+  return busProcess();
+}
+
+void TestPhone::replaceBus() {
+  endBus();
+  busProcess() = startBus(busConfig());
 }
 
 std::string TestPhone::root() {

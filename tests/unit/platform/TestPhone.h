@@ -21,8 +21,10 @@ class TestPhone : public testing::Environment {
   /// Makes the bus start `command` for an application.
   static void install(const std::string& appId, const std::string& command);
 
- private:
-  GPid _bus = 0;
+  /// The process of the bus.
+  static GPid bus();
+  /// Ends the bus and starts another one in its place.
+  static void replaceBus();
 };
 
 /// Runs the main loop until the condition holds; false when it never does.

@@ -18,7 +18,7 @@ std::string busName(const std::string& appId);
 std::string appIdOfBusName(const std::string& name);
 
 /// Whether the application runs or can be started. Asks the bus only, so it never waits for the
-/// application.
+/// application; while the bus does not answer, it may well be.
 bool isInstalled(GDBusConnection* bus, const std::string& appId);
 
 /// Who sent a message, as the bus knows it.

@@ -8,7 +8,7 @@
 #include <mutex>
 #include <thread>
 
-namespace contacts {
+namespace base {
 
 class Deadline {
  public:
@@ -27,4 +27,4 @@ class Deadline {
   std::thread _watch;
 };
 
-}  // namespace contacts
+}  // namespace base
