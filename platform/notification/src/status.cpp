@@ -6,7 +6,8 @@ namespace notification {
 
 StatusMessages::StatusMessages(std::function<void(const std::string&)> onMessage)
     : _onMessage(std::move(onMessage)),
-      _posted(base::sessionBus(), {nullptr, kStatusBar, kPosted, kStatusBarPath}, postedCb, this) {}
+      _posted(base::BusKind::Session, {nullptr, kStatusBar, kPosted, kStatusBarPath}, postedCb,
+              this) {}
 
 void StatusMessages::postedCb(GDBusConnection*, const char*, const char*, const char*, const char*,
                               GVariant* arguments, void* data) {

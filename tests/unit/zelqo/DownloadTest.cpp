@@ -358,8 +358,8 @@ TEST_F(SecureService, IsNotTrustedWhenNobodyVouchesForIt) {
 }
 
 TEST_F(SecureService, EndsThoughSomebodyNeverShakesHands) {
-  const base::Owned<GSocketClient, g_object_unref> client(g_socket_client_new());
-  const base::Owned<GSocketConnection, g_object_unref> silent(g_socket_client_connect_to_host(
+  const common::OwnedObject<GSocketClient> client(g_socket_client_new());
+  const common::OwnedObject<GSocketConnection> silent(g_socket_client_connect_to_host(
       client.get(), "127.0.0.1", static_cast<guint16>(std::stoi(service().port())), nullptr,
       nullptr));
   ASSERT_TRUE(silent);
