@@ -1,27 +1,28 @@
 // The yardstick: a bare Elementary window with a bare gengrid of N cells, each one picture and
-// nothing else. usage: bare_grid N PICTURE...   (pictures are used in turn)
+// nothing else. usage: bare_grid N LIST   (LIST: a text file with one picture's path per line; they
+// are used in turn)
 
-#include <Ecore_X.h>
 #include <Elementary.h>
 
 #include <cstdlib>
+#include <cstring>
+#include <fstream>
+#include <string>
 #include <vector>
 
 namespace {
 
-std::vector<const char*> pictures;
-
 Evas_Object* contentGet(void* data, Evas_Object* grid, const char* part) {
   if (strcmp(part, "elm.swallow.icon") != 0) return nullptr;
   Evas_Object* picture = elm_image_add(grid);
-  elm_image_file_set(picture, static_cast<const char*>(data), nullptr);
+  elm_image_file_set(picture, static_cast<const std::string*>(data)->c_str(), nullptr);
   elm_image_aspect_fixed_set(picture, EINA_TRUE);
   elm_image_fill_outside_set(picture, EINA_TRUE);
   evas_object_show(picture);
   return picture;
 }
 
-Evas_Object* createGrid(Evas_Object* window, long count) {
+Evas_Object* createGrid(Evas_Object* window, size_t count, const std::vector<std::string>& paths) {
   static Elm_Gengrid_Item_Class* itemClass = elm_gengrid_item_class_new();
   itemClass->item_style = "default";
   itemClass->func.content_get = contentGet;
@@ -31,8 +32,8 @@ Evas_Object* createGrid(Evas_Object* window, long count) {
   elm_gengrid_align_set(grid, 0.0, 0.0);
   elm_scroller_policy_set(grid, ELM_SCROLLER_POLICY_OFF, ELM_SCROLLER_POLICY_AUTO);
   elm_gengrid_item_size_set(grid, 180, 180);
-  for (long i = 0; i < count; ++i) {
-    elm_gengrid_item_append(grid, itemClass, pictures[i % pictures.size()], nullptr, nullptr);
+  for (size_t i = 0; i < count; ++i) {
+    elm_gengrid_item_append(grid, itemClass, &paths[i % paths.size()], nullptr, nullptr);
   }
   elm_win_resize_object_add(window, grid);
   evas_object_show(grid);
@@ -42,12 +43,15 @@ Evas_Object* createGrid(Evas_Object* window, long count) {
 }  // namespace
 
 EAPI_MAIN int elm_main(int argc, char** argv) {
-  if (argc < 3) return 2;
-  pictures.assign(argv + 2, argv + argc);
+  if (argc != 3) return 2;
+  static std::vector<std::string> paths;
+  std::ifstream list(argv[2]);
+  for (std::string path; std::getline(list, path);) paths.push_back(path);
+  if (paths.empty()) return 1;
   elm_policy_set(ELM_POLICY_QUIT, ELM_POLICY_QUIT_LAST_WINDOW_CLOSED);
   Evas_Object* window = elm_win_util_standard_add("bare-grid", "bare-grid");
   elm_win_autodel_set(window, EINA_TRUE);
-  createGrid(window, strtol(argv[1], nullptr, 10));
+  createGrid(window, strtoul(argv[1], nullptr, 10), paths);
   evas_object_resize(window, 720, 1280);
   evas_object_show(window);
   elm_run();
