@@ -61,6 +61,6 @@ int zelqo_recall_upload(unsigned int request_id, zelqo_recall_cb callback, void*
   if (key.empty()) return ZELQO_ERROR_NO_DATA;
   auto recall = std::make_unique<Recall>(share->token, callback, user_data);
   if (!recall->send(request_id, key)) return ZELQO_ERROR_NETWORK;
-  recall.release();  // its answer owns it
+  static_cast<void>(recall.release());  // its answer owns it
   return ZELQO_ERROR_NONE;
 }

@@ -22,7 +22,7 @@ class Uploader {
     std::vector<std::string> to;
     std::vector<std::string> paths;
     bool single = false;
-    std::int64_t lifetimeS = 14 * 24 * 3600;
+    std::int64_t lifetimeS = std::int64_t{14} * 24 * 3600;
     /// JSON text of a "files" array to be announced instead of what the paths are; for tests of
     /// what other phones do with odd shares.
     std::string rawFiles;
