@@ -115,7 +115,7 @@ TEST_F(DownloadWindow, ShowsAFileInItsFolder) {
 }
 
 TEST_F(DownloadWindow, OpensTheShareFromTheNotification) {
-  const Share share = thePhone().share({thePhone().makeFile("News.txt", 10)});
+  const Share share = thePhone().share({thePhone().makeFile("News.txt", 10)}, {"--single"});
   ASSERT_TRUE(selectFrom(share));
   ASSERT_TRUE(tap("News.txt"));
   ASSERT_TRUE(titleIs("1 selected"));
@@ -124,5 +124,7 @@ TEST_F(DownloadWindow, OpensTheShareFromTheNotification) {
   thePhone().closeViewer();
   thePhone()({"tap", "360,20"});
   EXPECT_TRUE(comes("News.txt, "));
-  EXPECT_NE(thePhone()({"launches", "--all"}).rfind(share.token), std::string::npos);
+  const std::string launch = thePhone()({"launches", "--all"});
+  EXPECT_NE(launch.find(share.token, launch.rfind("contents_token")), std::string::npos) << launch;
+  EXPECT_NE(launch.find("single_share", launch.rfind("contents_token")), std::string::npos);
 }

@@ -5,6 +5,7 @@
 #include <base/PhonePaths.h>
 #include <companion/Launch.h>
 #include <companion/Text.h>
+#include <zelqo/Store.h>
 
 #include <cstdlib>
 
@@ -35,6 +36,11 @@ std::string doneText(int count, const std::string& lastName) {
 std::string failedText(int count, const std::string& lastName) {
   if (count == 1) return format("%s could not be downloaded", safeName(lastName).c_str());
   return format("%d files could not be downloaded", count);
+}
+
+void openShare(const std::string& token) {
+  const auto share = zelqo::Store().received(token);
+  companion::openReceivedShare(token, share && share->single);
 }
 
 }  // namespace
@@ -113,8 +119,7 @@ void DownloadApp::_notifyWhenComplete(const std::string& token) {
   if (batch.failed > 0) {
     _notifier.post(failedText(batch.failed, batch.lastName), [this] { _showList(); });
   } else if (batch.done > 0 && !token.empty()) {
-    _notifier.post(doneText(batch.done, batch.lastName),
-                   [token] { companion::openReceivedShare(token, false); });
+    _notifier.post(doneText(batch.done, batch.lastName), [token] { openShare(token); });
   } else if (batch.done > 0) {
     _notifier.post(doneText(batch.done, batch.lastName), [this] { _showList(); });
   }
