@@ -27,7 +27,8 @@ std::string cachedPicture(const guchar* data, gsize size) {
   if (g_file_test(path.get(), G_FILE_TEST_EXISTS)) return path.get();
   OwnedError error;
   g_mkdir_with_parents(folder.get(), 0700);
-  if (!g_file_set_contents(path.get(), reinterpret_cast<const char*>(data), size, Out(error))) {
+  if (!g_file_set_contents(path.get(), reinterpret_cast<const char*>(data),
+                           static_cast<gssize>(size), Out(error))) {
     dlog_print(DLOG_ERROR, "CONTACTS", "a picture is lost: %s", error->message);
     return {};
   }

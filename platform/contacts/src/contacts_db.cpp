@@ -128,7 +128,8 @@ int answer(Records records, int offset, int limit, contacts_list_h* list) {
   const size_t rest = records.size() - first;
   const size_t count = limit == 0 ? rest : std::min(rest, static_cast<size_t>(limit));
   auto result = std::make_unique<contacts_list_s>();
-  std::move(records.begin() + first, records.begin() + first + count,
+  const auto begin = std::next(records.begin(), static_cast<std::ptrdiff_t>(first));
+  std::move(begin, std::next(begin, static_cast<std::ptrdiff_t>(count)),
             std::back_inserter(result->records));
   *list = result.release();
   return CONTACTS_ERROR_NONE;

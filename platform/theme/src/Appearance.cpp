@@ -78,8 +78,9 @@ void Appearance::forget(const FontTable* table) {
 
 bool Appearance::colourObject(Evas_Object* object, const std::string& code) {
   if (!setColour(object, code)) return false;
-  if (_objects.find(object) == _objects.end())
+  if (_objects.find(object) == _objects.end()) {
     evas_object_event_callback_add(object, EVAS_CALLBACK_DEL, objectDeletedCb, this);
+  }
   _objects[object] = code;
   return true;
 }
@@ -109,8 +110,9 @@ void Appearance::applyColours() {
 
 void Appearance::applyFonts() {
   if (!_fonts) return;
-  for (const auto& [code, font] : _fonts->fonts())
+  for (const auto& [code, font] : _fonts->fonts()) {
     edje_text_class_set(code.c_str(), font.name.c_str(), font.size * currentTextSize() / 100);
+  }
 }
 
 }  // namespace theme

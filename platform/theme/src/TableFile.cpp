@@ -7,7 +7,7 @@
 namespace theme {
 namespace {
 
-constexpr size_t kMaxBytes = 1024 * 1024;
+constexpr size_t kMaxBytes = size_t{1024} * 1024;
 
 const xmlChar* xmlText(const char* text) {
   return reinterpret_cast<const xmlChar*>(text);
@@ -30,8 +30,9 @@ std::unique_ptr<TableFile> TableFile::read(const char* path, const char* root) {
   // A table needs no document type, and a document type can make a small file a large one.
   if (document && !document->intSubset) {
     xmlNode* element = xmlDocGetRootElement(document.get());
-    if (element && xmlStrEqual(element->name, xmlText(root)))
+    if (element && xmlStrEqual(element->name, xmlText(root))) {
       return std::unique_ptr<TableFile>(new TableFile(document.release(), element));
+    }
   }
   dlog_print(DLOG_ERROR, "THEME", "%s is not a %s", path ? path : "(null)", root);
   return nullptr;
@@ -50,7 +51,7 @@ void TableFile::forEach(const xmlNode* parent, const char* name,
 
 std::string TableFile::text(const xmlNode* node, const char* attribute) {
   xmlChar* value = xmlGetNoNsProp(node, xmlText(attribute));
-  const std::string text = value ? reinterpret_cast<const char*>(value) : "";
+  std::string text = value ? reinterpret_cast<const char*>(value) : "";
   xmlFree(value);
   return text;
 }

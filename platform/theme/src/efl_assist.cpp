@@ -19,8 +19,9 @@ Eina_Bool ea_theme_font_get(const char* code, char** font, int* size) {
   if (base::strikes(__func__)) return EINA_FALSE;
   const char* name = nullptr;
   int pixels = 0;
-  if (!code || !font || !size || !edje_text_class_get(code, &name, &pixels) || !name)
+  if (!code || !font || !size || !edje_text_class_get(code, &name, &pixels) || !name) {
     return EINA_FALSE;
+  }
   *font = strdup(name);
   *size = pixels;
   return EINA_TRUE;
