@@ -67,5 +67,7 @@ bool waitFor(const std::function<bool()>& condition,
 
 /// The phone of this test program; started by the first call.
 Phone& thePhone();
+/// Another one in its place, started with these options of `phone up`.
+Phone& thePhoneWith(const Words& upOptions);
 
 }  // namespace phone

@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <filesystem>
 #include <memory>
 
@@ -22,26 +23,32 @@ std::string end(const std::string& text) {
   return text.substr(text.find('\n', text.size() - kBytes) + 1);
 }
 
+void putAway() {
+  if (!current()) return;
+  current()->command({"down"});
+  EXPECT_EQ(current()->sanitizerFindings(), "");
+  current().reset();
+}
+
 class PutAway : public testing::Environment {
  public:
-  void TearDown() override {
-    if (!current()) return;
-    current()->command({"down"});
-    EXPECT_EQ(current()->sanitizerFindings(), "");
-    current().reset();
-  }
+  void TearDown() override { putAway(); }
 };
 
 /// What the screen shows at a test's first failure, before its fixture puts the phone in order.
 class Pictures : public testing::EmptyTestEventListener {
-  void OnTestStart(const testing::TestInfo&) override { _picture.clear(); }
+  void OnTestStart(const testing::TestInfo& test) override {
+    _picture.clear();
+    _name = std::string(test.test_suite_name()) + "." + test.name();
+    std::replace(_name.begin(), _name.end(), '/', '-');
+  }
 
+  // googletest holds its lock here: nothing below may ask it for anything.
   void OnTestPartResult(const testing::TestPartResult& part) override {
-    const testing::TestInfo* test = testing::UnitTest::GetInstance()->current_test_info();
-    if (!part.failed() || !test || !_picture.empty() || !current() || !current()->isUp()) return;
+    if (!part.failed() || !_picture.empty() || !current() || !current()->isUp()) return;
     const std::string folder = std::string(BUILD_DIR) + "/test-results";
     std::filesystem::create_directories(folder);
-    _picture = folder + "/" + test->test_suite_name() + "." + test->name() + ".png";
+    _picture = folder + "/" + _name + ".png";
     if (current()->command({"screenshot", _picture}).status != 0) _picture = "(none)";
   }
 
@@ -51,16 +58,19 @@ class Pictures : public testing::EmptyTestEventListener {
            end(current()->command({"log"}).out).c_str());
   }
 
-  std::string _picture;
+  std::string _name, _picture;
 };
 
 }  // namespace
 
 Phone& thePhone() {
-  if (!current()) {
-    const auto program = std::filesystem::read_symlink("/proc/self/exe");
-    current() = std::make_unique<Phone>(program.filename().string());
-  }
+  return current() ? *current() : thePhoneWith({});
+}
+
+Phone& thePhoneWith(const Words& upOptions) {
+  putAway();
+  const auto program = std::filesystem::read_symlink("/proc/self/exe");
+  current() = std::make_unique<Phone>(program.filename().string(), upOptions);
   return *current();
 }
 
