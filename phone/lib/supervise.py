@@ -12,7 +12,8 @@ from lib.report import Failure
 from lib.sharing import Sharing
 from lib.state import ROOT, State
 
-_CONTACTS = "/usr/libexec/evolution-addressbook-factory"
+_ADDRESS_BOOK = "/usr/libexec/evolution-addressbook-factory"
+_RESTART = 0.5   # seconds, before a service that ended is started again
 
 
 def together(*jobs):
@@ -138,12 +139,30 @@ class Phone:
         return begun
 
     def _wake_contacts(self):
-        """Their first start takes longest of all, so it goes on beside everything else. The
-        machine's own way would end them when nobody uses them for a while."""
-        self.program("contacts", [_CONTACTS, "--keep-running"]).start()
+        """Their start takes longest of all, so it goes on beside everything else. The machine's own
+        way would end the address book when nobody uses it for a while."""
+        self.program("address-book", [_ADDRESS_BOOK, "--keep-running"]).start()
+        service = self.tool("phone-contacts")
+        if service:
+            contacts = self.program("contacts", [service])
+            contacts.start()
+            self._keep(contacts)
 
     def _warm_contacts(self):
-        buses.wait(self, "org.gnome.evolution.dataserver.AddressBook10")
+        if self.tool("phone-contacts"):
+            buses.wait(self, "phone.Contacts")
+
+    def _keep(self, program):
+        """Starts it again when it ends, as long as the phone is up."""
+
+        def watch():
+            while not self.over.is_set():
+                program.wait()
+                if not self.over.wait(_RESTART):
+                    print(f"{program.name} ended and is started again", flush=True)
+                    program.start()
+
+        threading.Thread(target=watch, daemon=True).start()
 
     def _start_notifications(self):
         buses.environment(self, {"DISPLAY": self.display})

@@ -1,72 +1,47 @@
 #include "Person.h"
 
-#include <common/Owned.h>
-#include <dlog.h>
-
 namespace contacts {
 namespace {
 
-using common::Out;
-using common::Owned;
-using common::OwnedError;
-using common::OwnedText;
-
-void freeAttributes(GList* attributes) {
-  g_list_free_full(attributes, reinterpret_cast<GDestroyNotify>(e_vcard_attribute_free));
-}
-
-std::string text(const char* maybe) {
-  return maybe ? maybe : "";
-}
-
-/// Address books that keep pictures inside the record have them written to the cache, once.
-std::string cachedPicture(const guchar* data, gsize size) {
-  const OwnedText name(g_compute_checksum_for_data(G_CHECKSUM_SHA256, data, size));
-  const OwnedText folder(g_build_filename(g_get_user_cache_dir(), "contact-pictures", nullptr));
-  const OwnedText path(g_build_filename(folder.get(), name.get(), nullptr));
-  if (g_file_test(path.get(), G_FILE_TEST_EXISTS)) return path.get();
-  OwnedError error;
-  g_mkdir_with_parents(folder.get(), 0700);
-  if (!g_file_set_contents(path.get(), reinterpret_cast<const char*>(data),
-                           static_cast<gssize>(size), Out(error))) {
-    dlog_print(DLOG_ERROR, "CONTACTS", "a picture is lost: %s", error->message);
-    return {};
-  }
-  return path.get();
-}
-
-std::string pictureOf(EContact* contact) {
-  const Owned<EContactPhoto, e_contact_photo_free> photo(
-      static_cast<EContactPhoto*>(e_contact_get(contact, E_CONTACT_PHOTO)));
-  if (!photo) return {};
-  if (photo->type == E_CONTACT_PHOTO_TYPE_URI) {
-    const OwnedText path(g_filename_from_uri(photo->data.uri, nullptr, nullptr));
-    return text(path.get());
-  }
-  gsize size = 0;
-  const guchar* data = e_contact_photo_get_inlined(photo.get(), &size);
-  return data && size ? cachedPicture(data, size) : std::string();
-}
-
-std::vector<std::string> numbersOf(EContact* contact) {
-  const Owned<GList, freeAttributes> attributes(e_contact_get_attributes(contact, E_CONTACT_TEL));
-  std::vector<std::string> numbers;
-  for (const GList* item = attributes.get(); item; item = item->next) {
-    const OwnedText number(e_vcard_attribute_get_value(static_cast<EVCardAttribute*>(item->data)));
-    if (number && *number) numbers.emplace_back(number.get());
-  }
-  return numbers;
+GVariant* textOf(const std::string& text) {
+  return g_variant_new_take_string(g_utf8_make_valid(text.c_str(), -1));
 }
 
 }  // namespace
 
-Person readPerson(EContact* contact) {
-  Person person;
-  person.name = text(static_cast<const char*>(e_contact_get_const(contact, E_CONTACT_FULL_NAME)));
-  person.picture = pictureOf(contact);
-  person.numbers = numbersOf(contact);
-  person.hasMail = e_contact_get_const(contact, E_CONTACT_EMAIL_1) != nullptr;
-  return person;
+GVariant* toVariant(const std::vector<Person>& persons) {
+  GVariantBuilder list;
+  g_variant_builder_init(&list, G_VARIANT_TYPE("a(issasb)"));
+  for (const Person& person : persons) {
+    GVariantBuilder numbers;
+    g_variant_builder_init(&numbers, G_VARIANT_TYPE_STRING_ARRAY);
+    for (const auto& number : person.numbers) {
+      g_variant_builder_add_value(&numbers, textOf(number));
+    }
+    g_variant_builder_add(&list, "(i@s@sasb)", person.id, textOf(person.name),
+                          textOf(person.picture), &numbers, person.hasMail);
+  }
+  return g_variant_new("(a(issasb))", &list);
+}
+
+std::vector<Person> fromVariant(GVariant* persons) {
+  std::vector<Person> result;
+  GVariantIter* list = nullptr;
+  g_variant_get(persons, kPersonsType, &list);
+  const char *name = nullptr, *picture = nullptr, *number = nullptr;
+  GVariantIter* numbers = nullptr;
+  gint32 id = 0;
+  gboolean hasMail = FALSE;
+  while (g_variant_iter_loop(list, "(i&s&sasb)", &id, &name, &picture, &numbers, &hasMail)) {
+    Person& person = result.emplace_back();
+    person.id = id;
+    person.name = name;
+    person.picture = picture;
+    while (g_variant_iter_next(numbers, "&s", &number)) person.numbers.emplace_back(number);
+    person.hasMail = hasMail;
+  }
+  g_variant_iter_free(list);
+  return result;
 }
 
 std::string digitsOf(const std::string& number) {

@@ -5,14 +5,14 @@
 #include <algorithm>
 #include <memory>
 
-#include "AddressBook.h"
 #include "Filter.h"
+#include "PersonIndex.h"
 #include "Record.h"
 
 namespace {
 
-using contacts::AddressBook;
 using contacts::Person;
+using contacts::PersonIndex;
 using contacts::View;
 
 struct Callback {
@@ -27,7 +27,7 @@ struct Callback {
 
 struct Connection {
   int users = 0;
-  std::unique_ptr<AddressBook> book;
+  std::unique_ptr<PersonIndex> index;
   std::vector<Callback> callbacks;
 };
 
@@ -87,11 +87,11 @@ void addNumbers(Records& records, const Person& person) {
 
 Records allRecords(View view) {
   Records records;
-  for (const auto& entry : connection().book->persons()) {
+  for (const Person& person : connection().index->persons()) {
     if (view == View::Person) {
-      records.push_back(common(_contacts_person, _contacts_person.id, entry.second));
+      records.push_back(common(_contacts_person, _contacts_person.id, person));
     } else {
-      addNumbers(records, entry.second);
+      addNumbers(records, person);
     }
   }
   return records;
@@ -141,9 +141,9 @@ int contacts_connect(void) {
   if (base::strikes(__func__)) return CONTACTS_ERROR_IPC_NOT_AVALIABLE;
   Connection& current = connection();
   if (current.users == 0) {
-    auto book = std::make_unique<AddressBook>(tellAll);
-    if (!book->open()) return CONTACTS_ERROR_IPC_NOT_AVALIABLE;
-    current.book = std::move(book);
+    auto index = std::make_unique<PersonIndex>(tellAll);
+    if (!index->open()) return CONTACTS_ERROR_IPC_NOT_AVALIABLE;
+    current.index = std::move(index);
   }
   current.users++;
   return CONTACTS_ERROR_NONE;
@@ -154,7 +154,7 @@ int contacts_disconnect(void) {
   Connection& current = connection();
   if (current.users == 0) return CONTACTS_ERROR_DB;
   if (--current.users == 0) {
-    current.book.reset();
+    current.index.reset();
     current.callbacks.clear();
   }
   return CONTACTS_ERROR_NONE;
@@ -165,7 +165,7 @@ int contacts_db_add_changed_cb(const char* view_uri, contacts_db_changed_cb call
   if (base::strikes(__func__)) return CONTACTS_ERROR_DB;
   const auto view = contacts::viewOf(view_uri);
   if (!view || !callback) return CONTACTS_ERROR_INVALID_PARAMETER;
-  if (!connection().book) return CONTACTS_ERROR_DB;
+  if (!connection().index) return CONTACTS_ERROR_DB;
   connection().callbacks.push_back({*view, callback, user_data});
   return CONTACTS_ERROR_NONE;
 }
@@ -188,7 +188,7 @@ int contacts_db_get_records_with_query(contacts_query_h query, int offset, int l
   if (base::strikes(__func__)) return CONTACTS_ERROR_DB;
   if (!query || !record_list || offset < 0 || limit < 0) return CONTACTS_ERROR_INVALID_PARAMETER;
   *record_list = nullptr;
-  if (!connection().book) return CONTACTS_ERROR_DB;
+  if (!connection().index) return CONTACTS_ERROR_DB;
   Records records = allRecords(query->view);
   if (query->filter) {
     records.erase(
@@ -208,6 +208,6 @@ int contacts_db_get_all_records(const char* view_uri, int offset, int limit,
   const auto view = contacts::viewOf(view_uri);
   if (!view || !record_list || offset < 0 || limit < 0) return CONTACTS_ERROR_INVALID_PARAMETER;
   *record_list = nullptr;
-  if (!connection().book) return CONTACTS_ERROR_DB;
+  if (!connection().index) return CONTACTS_ERROR_DB;
   return answer(allRecords(*view), offset, limit, record_list);
 }

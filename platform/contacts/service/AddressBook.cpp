@@ -32,9 +32,9 @@ AddressBook::~AddressBook() {
   if (_reopening) g_source_remove(_reopening);
 }
 
-bool AddressBook::open() {
+void AddressBook::open() {
   _begin();
-  return !_opening->isOver(kMoment) || _install();
+  if (_opening->isOver(kMoment) && !_install()) _reopenLater();
 }
 
 void AddressBook::_begin() {

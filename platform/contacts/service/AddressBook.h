@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "AddressBookOpening.h"
-#include "Person.h"
+#include "PersonReader.h"
 
 namespace contacts {
 
@@ -21,9 +21,9 @@ class AddressBook {
   AddressBook(const AddressBook&) = delete;
   AddressBook& operator=(const AddressBook&) = delete;
 
-  /// Waits a moment for the address book; one that needs longer comes later, which is a change.
-  /// False, with a log line, when there is none.
-  bool open();
+  /// Waits a moment for the address book; one that needs longer, or cannot be read now, comes
+  /// later, which is a change.
+  void open();
 
   /// By the address book's own ids.
   const std::map<std::string, Person>& persons() const { return _persons; }

@@ -3,7 +3,7 @@
 #include <base/Deadline.h>
 
 #include "BookConnection.h"
-#include "Person.h"
+#include "PersonReader.h"
 
 namespace contacts {
 
