@@ -149,6 +149,8 @@ class Phone:
             self._keep(contacts)
 
     def _warm_contacts(self):
+        """The service answers before a slow address book is there; the phone is ready with both."""
+        buses.wait(self, "org.gnome.evolution.dataserver.AddressBook10")
         if self.tool("phone-contacts"):
             buses.wait(self, "phone.Contacts")
 
