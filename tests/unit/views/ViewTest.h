@@ -33,6 +33,9 @@ class BlankPage : public app_assist::WContentViewController {
   Evas_Object* onCreateView(Evas_Object* parent, void*) override { return elm_layout_add(parent); }
 };
 
+/// Runs all tests inside the application, on buses of its own, and ends the process.
+[[noreturn]] void runViewTests(int argc, char** argv);
+
 /// Runs the main loop until the condition holds; false when it does not within some seconds.
 bool waitUntil(const std::function<bool()>& condition);
 
