@@ -10,7 +10,7 @@ import urllib.request
 from collections import namedtuple
 
 from lib import pictures
-from lib.subject import PROGRAM, SHARED, tool
+from lib.subject import PROGRAM, SHARED, address_of, tool
 from lib.table import median
 
 Settings = namedtuple("Settings", "runs quick")
@@ -312,7 +312,7 @@ def signal(subject, table, settings):
     name = f"{MAGENTA}-{count}"
     for which, number in (("last", count - 1), ("first, which is drawn", 0)):
         spent = [subject.stopwatch("signal", subject.pid("zelqo-viewer"), 200,
-                                   f"http://bench.invalid/{name}/{number}")["us"]
+                                   address_of(name, number))["us"]
                  for _ in range(settings.runs)]
         table.number(f"one download signal, {count:,} files, the {which}", median(spent), "us", 200)
     subject.end("zelqo-viewer")

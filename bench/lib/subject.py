@@ -20,6 +20,11 @@ def tool(name):
     return os.path.join(BUILD, "bin", name)
 
 
+def address_of(share, number):
+    """Where a file of an announced share would be, if there were one."""
+    return f"http://b.invalid/{share}/{number}"
+
+
 class Subject:
     """A phone with a state folder of its own, which a run begins anew."""
 
@@ -94,15 +99,13 @@ class Subject:
 
     def announce(self, name, pictures):
         """A share of so many files whose thumbnails are all on the phone already."""
+        # Short, for the service takes announcements of 2 MiB.
         files = [{"name": f"{number:05}.png", "size": 150000, "type": "image/png",
-                  "url": f"http://bench.invalid/{name}/{number}",
-                  "thumb": f"http://bench.invalid/{name}/{number}/normal",
-                  "mid": f"http://bench.invalid/{name}/{number}/mid",
-                  "big": f"http://bench.invalid/{name}/{number}/big"}
-                 for number in range(len(pictures))]
+                  "url": address_of(name, number), "thumb": address_of(name, number) + "/t",
+                  "mid": address_of(name, number) + "/m"} for number in range(len(pictures))]
         manifest = os.path.join(self.work, name + ".json")
         with open(manifest, "w", encoding="utf-8") as file:
-            json.dump(files, file)
+            json.dump(files, file, separators=(",", ":"))
         self._remember(files, pictures)
         return self._token("share", "--from", "+821011112222", "--to", ME,
                            "--raw-manifest", manifest)
