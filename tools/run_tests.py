@@ -18,11 +18,14 @@ ROOT = os.path.dirname(os.path.dirname(os.path.abspath(__file__)))
 sys.path.insert(0, os.path.join(ROOT, "phone"))
 from lib import sandbox  # noqa: E402
 
+import fuzzing  # noqa: E402
+
 PHONE = os.path.join(ROOT, "phone", "phone")
 PATIENCE = 300        # seconds for one program
 LAST_LINES = 40
 SANITIZER_FACTOR = 4  # how much slower programs may be under the sanitizers
 AT_A_TIME = 2         # phones outside the one of the unit tests
+FUZZ_SECONDS = 20     # for each fuzzer, unless the environment says otherwise; 0 for none
 
 
 def arguments():
@@ -244,11 +247,29 @@ class Runner:
             os.killpg(process.pid, signal.SIGTERM)
 
 
+def start_fuzzing(options, runner):
+    """The fuzzers have sanitizers of their own, so they run with the plain tests only."""
+    seconds = int(os.environ.get("FUZZ_SECONDS", FUZZ_SECONDS))
+    names = [] if options.sanitize or seconds < 1 else fuzzing.targets(options.only)
+    if not names:
+        return None
+    started = fuzzing.Fuzzing(names, seconds)
+    runner.running.add(started.process)
+    return started
+
+
 def main():
-    runner = Runner(arguments())
+    options = arguments()
+    runner = Runner(options)
     signal.signal(signal.SIGTERM, runner.stop)
     signal.signal(signal.SIGINT, runner.stop)
+    background = start_fuzzing(options, runner)
     total = runner.run_all()
+    if background:
+        passed, failed, output = background.wait()
+        print(output.rstrip(), flush=True)
+        total.passed += passed
+        total.failed += failed
     print(f"{total.passed} passed, {total.failed} failed")
     return 1 if total.failed or not total.passed or runner.stopping else 0
 
