@@ -101,7 +101,7 @@ void Phone::launchReceived(const std::string& token) const {
 void Phone::closeViewer() const {
   (*this)({"shell", "sh", "-c",
            "p=$(pidof zelqo-viewer) || exit 0; kill $p; "
-           "while kill -0 $p 2>/dev/null; do sleep 0.02; done"});
+           "while [ -e /proc/$p/exe ]; do sleep 0.02; done"});
 }
 
 std::string Phone::sanitizerFindings() const {
