@@ -42,7 +42,6 @@ class ZQVDownloadSignals {
   gulong _closed = 0;
   guint _downloading = 0;
   guint _downloaded = 0;
-  guint _failed = 0;
   Handler _handler;
   ZQVTimer _again;
 };

@@ -12,8 +12,6 @@ constexpr const char* kInterface = "org.tizen.call.remote.share";
 constexpr const char* kPath = "/com/orlant/remoteshare";
 constexpr const char* kDownloading = "file_downloading";
 constexpr const char* kDownloaded = "file_downloaded";
-// Failed or cancelled: the user may ask for the file again.
-constexpr const char* kFailed = "file_failed";
 constexpr double kReconnectSeconds = 1.0;
 
 }  // namespace
@@ -40,12 +38,10 @@ bool ZQVDownloadSignals::_connect(GError** error) {
   _closed = g_signal_connect(_bus, "closed", G_CALLBACK(_closedCb), this);
   _downloading = _subscribe(kDownloading);
   _downloaded = _subscribe(kDownloaded);
-  _failed = _subscribe(kFailed);
   return true;
 }
 
 void ZQVDownloadSignals::_disconnect() {
-  _unsubscribe(_failed);
   _unsubscribe(_downloaded);
   _unsubscribe(_downloading);
   if (_bus) g_clear_signal_handler(&_closed, _bus);

@@ -18,8 +18,8 @@ class DownloadWindow : public DownloadPage {
  protected:
   /// The window with one download that has stopped half way.
   void openHalfWay(const std::string& name) {
-    const Share share = _gate.share(name, kMegabytes);
-    ASSERT_TRUE(selectFrom(share));
+    _share = _gate.share(name, kMegabytes);
+    ASSERT_TRUE(selectFrom(_share));
     ASSERT_TRUE(tap(name));
     ASSERT_TRUE(titleIs("1 selected"));
     ASSERT_TRUE(tap("Done"));
@@ -45,6 +45,7 @@ class DownloadWindow : public DownloadPage {
   }
 
   Gate _gate{kMegabytes * kMegabyte / 2};
+  Share _share;
 };
 
 }  // namespace
@@ -61,13 +62,13 @@ TEST_F(DownloadWindow, ShowsHowFarADownloadHasCome) {
   EXPECT_TRUE(goes("Progress: "));
 }
 
-TEST_F(DownloadWindow, CancelsAndTheViewerOffersTheFileAgain) {
+TEST_F(DownloadWindow, CancelsAndTheShareOffersTheFileWhenItIsOpenedAgain) {
   openHalfWay("Unwanted.mp4");
   ASSERT_TRUE(tap("Cancel Unwanted.mp4"));
   ASSERT_TRUE(comes("Unwanted.mp4, Cancelled"));
   EXPECT_TRUE(comes("Retry Unwanted.mp4"));
   for (const auto& file : fs::directory_iterator(ofPhone(kFolder))) ADD_FAILURE() << file.path();
-  thePhone()({"key", "Escape"});
+  thePhone().launchReceived(_share.token);
   EXPECT_TRUE(cellIs("Unwanted.mp4", "not downloaded"));
 }
 

@@ -29,10 +29,9 @@ std::ostream& operator<<(std::ostream& out, const Signal& signal) {
 
 /// The rules: who has which status after a signal.
 void follow(const Signal& signal, const Items& files, std::vector<int>* statuses) {
-  if (!signal.hasAddressOnly || signal.member == "file_deleted") return;
-  const int status = signal.member == "file_downloading"  ? 2
-                     : signal.member == "file_downloaded" ? 3
-                                                          : 0;
+  const bool isDownloading = signal.member == "file_downloading";
+  if (!signal.hasAddressOnly || (!isDownloading && signal.member != "file_downloaded")) return;
+  const int status = isDownloading ? 2 : 3;
   for (size_t i = 0; i < files.size(); ++i) {
     if (signal.address != files[i].downloadUrl) continue;
     (*statuses)[i] = status;

@@ -98,7 +98,6 @@ void DownloadApp::onDone(const Download& download) {
 }
 
 void DownloadApp::onFailed(const Download& download) {
-  _signals.failed(download.url);
   Batch& batch = _batches[download.token];
   batch.failed++;
   batch.lastName = download.name;
@@ -106,7 +105,6 @@ void DownloadApp::onFailed(const Download& download) {
 }
 
 void DownloadApp::onCancelled(const Download& download) {
-  _signals.failed(download.url);
   _notifyWhenComplete(download.token);
 }
 

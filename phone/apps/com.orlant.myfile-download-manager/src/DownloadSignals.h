@@ -10,8 +10,6 @@ class DownloadSignals {
  public:
   void downloading(const std::string& url) { _emit("file_downloading", url); }
   void downloaded(const std::string& url) { _emit("file_downloaded", url); }
-  /// Failed or cancelled: it can be asked for again.
-  void failed(const std::string& url) { _emit("file_failed", url); }
 
  private:
   void _emit(const char* member, const std::string& url);
