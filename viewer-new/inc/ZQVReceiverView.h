@@ -1,15 +1,20 @@
 #pragma once
 
+#include <Ecore.h>
 #include <app_assist.h>
 #include <stdint.h>
 
+#include <set>
 #include <string>
 
 #include "ZQVDownloadSignals.h"
 #include "ZQVGridFiller.h"
 #include "ZQVItemGrid.h"
+#include "ZQVOwned.h"
 #include "ZQVSmartCallback.h"
 #include "ZQVWeakObject.h"
+
+class ZQViewerThumbnailItem;
 
 /// The page of a received share: who sent it, how much, until when, and the files with the state of
 /// their downloads.
@@ -54,6 +59,8 @@ class ZQVReceiverView : public app_assist::WContentViewController {
   std::string _hint() const;
   void _launchDbusMonitor();
   void _downloadSignalCb(const char* member, const char* url);
+  void _redrawLater(ZQViewerThumbnailItem* item);
+  static void _redrawCb(void* data);
   void _openFullView(Elm_Object_Item* cell);
   void _openSelectView();
   void _updateToolbarState();
@@ -72,4 +79,6 @@ class ZQVReceiverView : public app_assist::WContentViewController {
   std::string _contentsToken;
   ZQVSmartCallback _rotation;
   ZQVDownloadSignals _signals;
+  std::set<ZQViewerThumbnailItem*> _changed;  ///< cells that show an earlier state
+  ZQVOwned<Ecore_Job, ecore_job_del> _redraw;
 };

@@ -4,6 +4,8 @@
 #include <unicode/ustring.h>
 #include <vconf.h>
 
+#include <utility>
+
 #include "ZQVAccess.h"
 #include "ZQVCommon.h"
 #include "ZQVFullView.h"
@@ -197,12 +199,27 @@ void ZQVReceiverView::_downloadSignalCb(const char* member, const char* url) {
     if (!cell || g_strcmp0(item->downloadUrl, url) != 0) continue;
     if (item->downloadStatus != status) {
       item->downloadStatus = status;
-      elm_gengrid_item_update(cell);
       zqvSetAccessibleName(cell, zqvCellName(*item));
+      _redrawLater(item);
     }
     break;
   }
   _updateToolbarState();
+}
+
+/// A cell is built anew, which takes its time: once for all signals that came together, or whoever
+/// sends many could keep the page from everything else.
+void ZQVReceiverView::_redrawLater(ZQViewerThumbnailItem* item) {
+  _changed.insert(item);
+  if (!_redraw) _redraw = ZQVOwned<Ecore_Job, ecore_job_del>(ecore_job_add(_redrawCb, this));
+}
+
+void ZQVReceiverView::_redrawCb(void* data) {
+  auto* view = static_cast<ZQVReceiverView*>(data);
+  (void)view->_redraw.release();  // a job that runs frees itself
+  for (const ZQViewerThumbnailItem* item : std::exchange(view->_changed, {})) {
+    if (Elm_Object_Item* cell = item->gridItems[ZQV_VIEW_RECEIVER]) elm_gengrid_item_update(cell);
+  }
 }
 
 void ZQVReceiverView::_gridItemCb(void* data, Evas_Object*, void* cell) {

@@ -129,12 +129,13 @@ TEST_F(DownloadSignals, OfOtherTypesAreLoggedAndIgnored) {
 
 TEST_F(DownloadSignals, InABurstOfTenThousandLeaveThePageUsable) {
   constexpr int kSignals = 10000;
+  const std::string one = url(0);  // asks the phone, which takes its time
   SystemBus bus;
   for (int i = 0; i < kSignals; i++) {
     bus.tell(i % 2 ? "file_downloaded" : "file_downloading",
-             i % 3 ? "http://127.0.0.1:9/" + std::to_string(i) : url(0));
+             i % 3 ? "http://127.0.0.1:9/" + std::to_string(i) : one);
   }
-  bus.tell("file_downloading", url(0));
+  bus.tell("file_downloading", one);
   ASSERT_TRUE(bus.flush());
   EXPECT_TRUE(cellIs("One.txt", "downloading"));
   tell("file_downloaded", 1);
