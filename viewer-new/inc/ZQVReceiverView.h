@@ -54,6 +54,7 @@ class ZQVReceiverView : public app_assist::WContentViewController {
   static void _gridDeletedCb(void* data, Evas* canvas, Evas_Object* grid, void* info);
   std::string _titleText() const;
   void _nameTitle();
+  void _showSummary();
   std::string _sizeLine() const;
   std::string _expiryLine() const;
   std::string _hint() const;

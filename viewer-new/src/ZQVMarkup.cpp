@@ -2,6 +2,8 @@
 
 #include <glib.h>
 
+#include <cstring>
+
 #include "ZQVOwned.h"
 #include "ZQVText.h"
 
@@ -36,4 +38,12 @@ std::string zqvFormatName(const char* id, const char* name, size_t limit) {
   const size_t frame = zqvFormat(id, "s", "").size();
   const std::string shown = zqvEscapeWithin(name, limit > frame ? limit - frame : 0);
   return zqvFormat(id, "s", shown.c_str());
+}
+
+std::string zqvFromReadingSide(const char* markup, bool isRightToLeft) {
+  constexpr const char* kLeft = "<align=left>";
+  std::string text = markup;
+  const size_t at = isRightToLeft ? text.find(kLeft) : std::string::npos;
+  if (at != std::string::npos) text.replace(at, strlen(kLeft), "<align=right>");
+  return text;
 }

@@ -69,7 +69,7 @@ Evas_Object* ZQVReceiverView::onCreateView(Evas_Object* parent, void*) {
   _label = elm_label_add(layout);
   elm_object_style_set(_label, "popup/default");
   elm_label_line_wrap_set(_label, ELM_WRAP_MIXED);
-  elm_object_text_set(_label, ZQVOwnedText(getSummaryText()).get());
+  _showSummary();
   elm_object_part_content_set(layout, "elm.swallow.label.text", _label);
 
   Evas_Object* grid = _grid.createVertical(parent, nullptr);
@@ -129,7 +129,7 @@ void ZQVReceiverView::update(int key) {
   setTitle(title.c_str());
   elm_object_item_domain_translatable_text_set(getNaviItem(), ZQV_TEXT_DOMAIN, title.c_str());
   _nameTitle();
-  elm_object_text_set(_label, ZQVOwnedText(getSummaryText()).get());
+  _showSummary();
   _updateCells();
   Evas_Object* download = _toolbarButton();
   if (!download) {
@@ -137,6 +137,12 @@ void ZQVReceiverView::update(int key) {
     return;
   }
   elm_object_domain_translatable_text_set(download, ZQV_TEXT_DOMAIN, kDownloadText);
+}
+
+void ZQVReceiverView::_showSummary() {
+  const ZQVOwnedText summary(getSummaryText());
+  const bool isRightToLeft = elm_object_mirrored_get(_label);
+  elm_object_text_set(_label, zqvFromReadingSide(summary.get(), isRightToLeft).c_str());
 }
 
 char* ZQVReceiverView::getSummaryText() const {

@@ -5,6 +5,8 @@
 #include <cstring>
 #include <regex>
 
+#include "WidgetWalk.h"
+
 namespace app_assist {
 namespace {
 
@@ -34,22 +36,17 @@ void refreshLabel(Evas_Object* label) {
   if (refreshed != text) elm_object_text_set(label, refreshed.c_str());
 }
 
-void refresh(Evas_Object* object) {
-  const char* type = evas_object_type_get(object);
-  if (!type) return;
+bool refresh(Evas_Object* object, const char* type) {
   if (strcmp(type, "elm_label") == 0) {
     refreshLabel(object);
   } else if (strcmp(type, "elm_gengrid") == 0) {
     elm_gengrid_realized_items_update(object);
   } else if (strcmp(type, "elm_genlist") == 0) {
     elm_genlist_realized_items_update(object);
-  } else if (efl_isa(object, EFL_CANVAS_GROUP_CLASS)) {
-    Eina_List* members = evas_object_smart_members_get(object);
-    while (members) {
-      refresh(static_cast<Evas_Object*>(eina_list_data_get(members)));
-      members = eina_list_remove_list(members, members);
-    }
+  } else {
+    return true;
   }
+  return false;
 }
 
 }  // namespace
@@ -71,8 +68,7 @@ std::string refreshedMarkup(const std::string& markup, const TextClassLookup& lo
 }
 
 void refreshTexts(Evas_Object* window) {
-  Evas_Object* object = evas_object_bottom_get(evas_object_evas_get(window));
-  for (; object; object = evas_object_above_get(object)) refresh(object);
+  walkWidgets(window, refresh);
 }
 
 }  // namespace app_assist

@@ -16,6 +16,7 @@
 #include "GlibBridge.h"
 #include "Language.h"
 #include "LateDestroyer.h"
+#include "ListLayout.h"
 #include "MarkupRefresh.h"
 #include "SettingKeys.h"
 #include "WindowPrivate.h"
@@ -56,7 +57,7 @@ struct WApp::Private {
   void refreshLater();
 
   static void refreshCb(void* data);
-  static void languageCb(keynode_t*, void*) { Language::apply(); }
+  static void languageCb(keynode_t*, void* data);
   static void paletteCb(keynode_t*, void* data);
   static void textSizeCb(keynode_t*, void* data);
 };
@@ -184,6 +185,14 @@ void WApp::Private::followSettings(bool follow) {
 /// The application's own tables hear of the change after this.
 void WApp::Private::refreshLater() {
   if (!refresh) refresh = ecore_job_add(refreshCb, this);
+}
+
+void WApp::Private::languageCb(keynode_t*, void* data) {
+  const bool wasMirrored = elm_config_mirrored_get();
+  Language::apply();
+  const auto* self = static_cast<Private*>(data);
+  Evas_Object* window = self->window ? self->window->getEvasObj() : nullptr;
+  if (window && elm_config_mirrored_get() != wasMirrored) layOutListsAgain(window);
 }
 
 void WApp::Private::refreshCb(void* data) {

@@ -29,6 +29,14 @@ TEST_F(Markup, OfAnUnknownClassIsStillMarkup) {
   EXPECT_NE(of("x", "unknown", "left").find("<align=left>x</align>"), std::string::npos);
 }
 
+TEST_F(Markup, BeginsWhereTheReaderDoes) {
+  const std::string markup = of("a <align=left>", "T024", "left");
+  EXPECT_EQ(zqvFromReadingSide(markup.c_str(), false), markup);
+  const std::string mirrored = zqvFromReadingSide(markup.c_str(), true);
+  EXPECT_NE(mirrored.find("<align=right>a <align=left></align>"), std::string::npos) << mirrored;
+  EXPECT_EQ(zqvFromReadingSide("plain", true), "plain");
+}
+
 TEST_F(Markup, ShowsAStrangersNameAsItIs) {
   EXPECT_EQ(zqvEscapeWithin("<b>R&D</b>", 500), "&lt;b&gt;R&amp;D&lt;/b&gt;");
 }
