@@ -53,7 +53,7 @@ class Sharing:
         os.makedirs(data, exist_ok=True)
         for port in (self._remembered_port(), "0"):
             self._service = self._phone.program(
-                "service", [program, "--data", data, "--port", port] + extra)
+                "service", [program, "--data", data, "--port", port, "--lenient"] + extra)
             try:
                 line = self._service.start_and_read()
                 break

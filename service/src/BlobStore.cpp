@@ -142,7 +142,9 @@ void BlobStore::discard(const std::string& folder) const {
   if (rename(folder.c_str(), grave.c_str()) == 0) {
     removeInBackground(grave);
   } else if (errno != ENOENT) {
-    g_warning("storage: cannot remove %s: %s", folder.c_str(), g_strerror(errno));
+    // The last part may be a share's token, which lets its holder in.
+    g_warning("storage: cannot remove a folder of %s: %s",
+              folder.substr(0, folder.rfind('/')).c_str(), g_strerror(errno));
   }
 }
 

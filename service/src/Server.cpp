@@ -21,7 +21,7 @@ Server::Server(Options options)
       _hub(_catalog, _options.publicUrl),
       _desk(_catalog, _blobs, _hub, _options.thumbnailProgram),
       _readSide(_catalog, _blobs, _stats),
-      _writeSide(_catalog, _blobs, _hub, _desk),
+      _writeSide(_catalog, _blobs, _hub, _desk, _options.lenient),
       _server(soup_server_new("server-header", "zelqo-service", nullptr)) {}
 
 Server::~Server() {
@@ -78,6 +78,10 @@ void Server::headersReadCb(SoupServer*, SoupServerMessage* message, const char*,
     answerError(message, SOUP_STATUS_FORBIDDEN, "refused");
   } else {
     server->_writeSide.prepare(message, path);
+  }
+  // What is refused already is still read to its end, but need not be kept.
+  if (soup_server_message_get_status(message) != 0) {
+    soup_message_body_set_accumulate(soup_server_message_get_request_body(message), FALSE);
   }
 }
 

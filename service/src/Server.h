@@ -27,6 +27,7 @@ struct Options {
   std::string thumbnailProgram;  ///< path
   guint delayMs = 0;             ///< every answer comes so much later
   bool refuse = false;           ///< every request is refused
+  bool lenient = false;          ///< shares may have gaps and name addresses of their own
 };
 
 class Server {

@@ -51,8 +51,9 @@ bool isUpload(SoupServerMessage* message, const WriteSide::Words& path) {
 
 }  // namespace
 
-WriteSide::WriteSide(Catalog& catalog, BlobStore& blobs, PushHub& hub, ShareDesk& desk)
-    : _catalog(catalog), _blobs(blobs), _hub(hub), _desk(desk) {
+WriteSide::WriteSide(Catalog& catalog, BlobStore& blobs, PushHub& hub, ShareDesk& desk,
+                     bool lenient)
+    : _catalog(catalog), _blobs(blobs), _hub(hub), _desk(desk), _lenient(lenient) {
   _desk.setPublishedListener([this](std::int64_t id) { publishedCb(id); });
 }
 
@@ -156,6 +157,7 @@ void WriteSide::create(SoupServerMessage* message) {
   draft.sender = *sender;
   const char* reason =
       body ? readDraft(json_node_get_object(body.get()), draft) : "a JSON object is expected";
+  if (!reason && draft.lenient && !_lenient) reason = "lenient: not at this service";
   if (reason) {
     answerError(message, SOUP_STATUS_BAD_REQUEST, reason);
     return;

@@ -20,7 +20,8 @@ class WriteSide {
  public:
   using Words = std::vector<std::string>;
 
-  WriteSide(Catalog& catalog, BlobStore& blobs, PushHub& hub, ShareDesk& desk);
+  /// Only a lenient one takes shares with gaps and addresses of their own.
+  WriteSide(Catalog& catalog, BlobStore& blobs, PushHub& hub, ShareDesk& desk, bool lenient);
 
   /// Before the body is read: who may not upload is told so now, and bodies are bounded.
   void prepare(SoupServerMessage* message, const Words& path);
@@ -46,6 +47,7 @@ class WriteSide {
   BlobStore& _blobs;
   PushHub& _hub;
   ShareDesk& _desk;
+  bool _lenient;
   std::list<std::pair<std::int64_t, HeldRequest>> _waiting;  ///< for publication, by share
 };
 

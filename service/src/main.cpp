@@ -17,6 +17,7 @@ struct Arguments {
   int port = 0;
   int delayMs = 0;
   gboolean refuse = FALSE;
+  gboolean lenient = FALSE;
 };
 
 bool readArguments(int argc, char** argv, Arguments& arguments) {
@@ -29,6 +30,8 @@ bool readArguments(int argc, char** argv, Arguments& arguments) {
       {"public-url", 0, 0, G_OPTION_ARG_STRING, &publicUrl,
        "Where recipients read, when another server does that", "URL"},
       {"delay", 0, 0, G_OPTION_ARG_INT, &arguments.delayMs, "Answer so much later", "MS"},
+      {"lenient", 0, 0, G_OPTION_ARG_NONE, &arguments.lenient,
+       "Take shares with gaps and addresses of their own, for tests of phones", nullptr},
       {"refuse", 0, 0, G_OPTION_ARG_NONE, &arguments.refuse, "Refuse every request", nullptr},
       {nullptr, 0, 0, G_OPTION_ARG_NONE, nullptr, nullptr, nullptr}};
   const service::Owned<GOptionContext, g_option_context_free> context(
@@ -90,6 +93,7 @@ int main(int argc, char** argv) {
   options.thumbnailProgram = thumbnailProgram();
   options.delayMs = static_cast<guint>(arguments.delayMs);
   options.refuse = arguments.refuse;
+  options.lenient = arguments.lenient;
   service::Server server(std::move(options));
   if (!server.start()) return 1;
 

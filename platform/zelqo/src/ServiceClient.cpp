@@ -8,6 +8,7 @@ namespace zelqo {
 namespace {
 
 constexpr int kConnections = 6;
+constexpr std::size_t kMaxReason = 512;
 
 void attachJson(SoupMessage* message, const std::string& json) {
   const common::Owned<GBytes, g_bytes_unref> bytes(g_bytes_new(json.data(), json.size()));
@@ -36,7 +37,7 @@ std::string errorText(const std::string& body, const std::string& fallback) {
   const common::JsonTree json = common::parseJsonObject(body);
   const auto text =
       json ? common::textMember(json_node_get_object(json.get()), "error") : std::nullopt;
-  return text.value_or(fallback);
+  return text && text->size() <= kMaxReason ? *text : fallback;
 }
 
 }  // namespace
@@ -63,6 +64,8 @@ ServiceClient::~ServiceClient() = default;
 MessageOwner ServiceClient::message(const Request& request) const {
   MessageOwner message = makeMessage(request.method, _url + request.path);
   if (!message) return nullptr;
+  // Nobody else gets the key, whatever the service says.
+  soup_message_add_flags(message.get(), SOUP_MESSAGE_NO_REDIRECT);
   if (!request.key.empty()) {
     soup_message_headers_replace(soup_message_get_request_headers(message.get()), "Authorization",
                                  ("Bearer " + request.key).c_str());

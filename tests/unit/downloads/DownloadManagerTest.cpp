@@ -183,6 +183,17 @@ TEST_F(Manager, SaysThatTheServiceRefused) {
   expectFailure("/1", 0, Failure::Refused);
 }
 
+TEST_F(Manager, TrustsNoServiceThatNobodyVouchesFor) {
+  TestServer secure(folder.path());
+  ASSERT_EQ(secure.url("").substr(0, 8), "https://");
+  secure["/1"].body = "from somebody else";
+  manager->setNetwork(Network::Wifi);
+  manager->add({wanted(secure.url("/1"), "a.bin")});
+  ASSERT_TRUE(waitForEnd());
+  EXPECT_EQ(last().failure, Failure::Network);
+  EXPECT_EQ(secure.requests(), 0);
+}
+
 TEST_F(Manager, GivesUpARedirectLoop) {
   server["/1"].location = "/2";
   server["/2"].location = "/1";

@@ -1,13 +1,39 @@
 #include "TestServer.h"
 
+#include <cstdlib>
+
 namespace {
 
 constexpr int kPatienceSeconds = 20;
 
+GTlsCertificate* makeCertificate(const std::string& folder) {
+  const std::string key = folder + "/key.pem";
+  const std::string certificate = folder + "/cert.pem";
+  const std::string make =
+      "openssl req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=127.0.0.1 "
+      "-addext subjectAltName=IP:127.0.0.1 -keyout " +
+      key + " -out " + certificate + " >/dev/null 2>&1 </dev/null";
+  if (system(make.c_str()) != 0) return nullptr;
+  return g_tls_certificate_new_from_files(certificate.c_str(), key.c_str(), nullptr);
+}
+
 }  // namespace
 
 TestServer::TestServer() : _server(soup_server_new(nullptr, nullptr)) {
-  soup_server_listen_local(_server, 0, SOUP_SERVER_LISTEN_IPV4_ONLY, nullptr);
+  _listen(SOUP_SERVER_LISTEN_IPV4_ONLY);
+}
+
+TestServer::TestServer(const std::string& certificateFolder)
+    : _server(soup_server_new(nullptr, nullptr)) {
+  GTlsCertificate* certificate = makeCertificate(certificateFolder);
+  soup_server_set_tls_certificate(_server, certificate);
+  g_clear_object(&certificate);
+  _listen(static_cast<SoupServerListenOptions>(SOUP_SERVER_LISTEN_IPV4_ONLY |
+                                               SOUP_SERVER_LISTEN_HTTPS));
+}
+
+void TestServer::_listen(SoupServerListenOptions options) {
+  soup_server_listen_local(_server, 0, options, nullptr);
   GSList* uris = soup_server_get_uris(_server);
   gchar* text = g_uri_to_string(static_cast<GUri*>(uris->data));
   _base = text;

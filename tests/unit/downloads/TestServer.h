@@ -21,6 +21,8 @@ struct Answer {
 class TestServer {
  public:
   TestServer();
+  /// Over TLS, with a certificate that nobody but itself vouches for; made in that folder.
+  explicit TestServer(const std::string& certificateFolder);
   ~TestServer();
   TestServer(const TestServer&) = delete;
   TestServer& operator=(const TestServer&) = delete;
@@ -36,6 +38,7 @@ class TestServer {
   static void _handleCb(SoupServer*, SoupServerMessage* message, const char* path, GHashTable*,
                         gpointer data);
   static void _wroteBodyDataCb(SoupServerMessage*, guint count, gpointer data);
+  void _listen(SoupServerListenOptions options);
   void _handle(SoupServerMessage* message, const std::string& path);
   void _sendHalf(SoupServerMessage* message, const Answer& answer);
 

@@ -123,7 +123,15 @@ TEST_F(Upload, RefusesAnAnnouncementOfManyMegabytes) {
   EXPECT_EQ(post(std::string(3 << 20, ' ')).status, 413U);
 }
 
+TEST_F(Upload, RefusesALenientShareUnlessItIsThereForTests) {
+  const char* const share = R"({"to":["+821012345678"],"lenient":true,"files":[{}]})";
+  EXPECT_EQ(post(share).status, 400U);
+  start({"--lenient"});
+  EXPECT_EQ(post(share).status, 201U);
+}
+
 TEST_F(Upload, LeavesGapsOnlyInALenientShare) {
+  start({"--lenient"});
   const HttpAnswer odd = post(
       R"({"to":["+821012345678"],"lenient":true,"files":[{"name":"a"},{"size":5},{},
           {"name":"b","size":1,"type":"image/png","thumb":"http://x/\"../y"}]})");
@@ -141,6 +149,7 @@ TEST_F(Upload, TakesAShareOfTenThousandFilesAndNoMore) {
   std::string list;
   for (int i = 0; i < 10000; i++) list += list.empty() ? "{}" : ",{}";
   const std::string head = R"({"to":["+821012345678"],"lenient":true,"files":[)";
+  start({"--lenient"});
   const HttpAnswer largest = post(head + list + "]}");
   EXPECT_EQ(largest.status, 201U);
   EXPECT_EQ(complete({std::to_string(largest.number("request_id")), ""}).status, 200U);
@@ -156,6 +165,19 @@ TEST_F(Upload, IsRefusedWhileSharingIsSwitchedOff) {
   EXPECT_EQ(http("PUT", status, R"({"status":"maybe"})", as(kAnna)).status, 400U);
   EXPECT_EQ(http("PUT", status, R"({"status":"on"})", as(kAnna)).text("status"), "on");
   EXPECT_EQ(httpGet(status, as(kBen)).status, 403U);
+}
+
+// Anybody can send a body, and its sender goes on sending however early the answer is clear.
+TEST_F(Upload, KeepsNothingOfABodyThatItRefuses) {
+#ifdef __SANITIZE_ADDRESS__
+  GTEST_SKIP() << "the sanitizer's own memory would count";
+#endif
+  const rlimit bound{96 << 20, 96 << 20};
+  ASSERT_EQ(prlimit(service().pid(), RLIMIT_DATA, &bound, nullptr), 0);
+  const std::string body(200 << 20, ' ');
+  EXPECT_EQ(http("POST", url() + "/v1/subscribers", body).status, 413U);
+  EXPECT_EQ(http("PUT", url() + "/v1/shares/1/files/0", body).status, 401U);
+  EXPECT_EQ(httpGet(url() + "/v1/stats").status, 200U);
 }
 
 // Neither way may hold the file in memory; mapped files do not count as data.

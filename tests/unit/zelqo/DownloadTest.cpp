@@ -2,11 +2,13 @@
 #include <gtest/gtest.h>
 #include <utime.h>
 #include <zelqo.h>
+#include <zelqo/Account.h>
 
 #include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <memory>
+#include <optional>
 #include <utility>
 #include <vector>
 
@@ -355,6 +357,17 @@ class SecureService : public Download {
 
 TEST_F(SecureService, IsNotTrustedWhenNobodyVouchesForIt) {
   expectRefusal();
+}
+
+TEST_F(SecureService, LearnsNoNumberWhenNobodyVouchesForIt) {
+  const TempFolder folder;
+  zelqo::Store store(folder.path("zelqo.db"));
+  zelqo::Account account(store, "+821012345678", service().url());
+  std::optional<int> error;
+  account.signUp("450051234567890", [&error](int result) { error = result; });
+  ASSERT_TRUE(waitUntil([&error] { return error.has_value(); }));
+  EXPECT_EQ(error, ZELQO_ERROR_NETWORK);
+  EXPECT_FALSE(account.signedUp());
 }
 
 TEST_F(SecureService, EndsThoughSomebodyNeverShakesHands) {

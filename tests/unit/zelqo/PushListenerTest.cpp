@@ -164,6 +164,21 @@ TEST_F(AnOddService, IsAskedAgainAfterAFailure) {
   EXPECT_EQ(failures, 3);
 }
 
+TEST_F(AnOddService, CannotSendTheKeyElsewhere) {
+  FakeServer elsewhere([](SoupServerMessage* message, const std::string&) {
+    answerWith(message, 200, R"({"events":[],"cursor":5})");
+  });
+  int redirects = 0;
+  EXPECT_TRUE(listensUpTo(5, [&](SoupServerMessage* message) {
+    if (redirects++ == 0) {
+      soup_server_message_set_redirect(message, 307, elsewhere.url("/v1/push").c_str());
+    } else {
+      answerWith(message, 200, R"({"events":[],"cursor":5})");
+    }
+  }));
+  EXPECT_EQ(elsewhere.requests(), 0);
+}
+
 TEST_F(AnOddService, LosesOnlyTheEventsThatMakeNoSense) {
   EXPECT_TRUE(listensUpTo(5, [](SoupServerMessage* message) {
     answerWith(message, 200,

@@ -18,7 +18,7 @@ const std::string kOwn = "+821012345678";
 
 class AnUploader : public testing::Test {
  protected:
-  AnUploader() : _store(_folder.path("zelqo.db")), _service(_folder.path("data")) {
+  AnUploader() : _store(_folder.path("zelqo.db")), _service(_folder.path("data"), {"--lenient"}) {
     setOwnNumber(kOwn);
     setServiceUrl(_service.url());
   }
