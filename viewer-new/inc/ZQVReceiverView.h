@@ -7,6 +7,7 @@
 #include <set>
 #include <string>
 
+#include "ZQVAddressIndex.h"
 #include "ZQVDownloadSignals.h"
 #include "ZQVGridFiller.h"
 #include "ZQVItemGrid.h"
@@ -65,6 +66,7 @@ class ZQVReceiverView : public app_assist::WContentViewController {
   void _openFullView(Elm_Object_Item* cell);
   void _openSelectView();
   void _updateToolbarState();
+  bool _isAnyToHave() const;
   void _updateCells();
   Evas_Object* _toolbarButton() const;
 
@@ -80,6 +82,7 @@ class ZQVReceiverView : public app_assist::WContentViewController {
   std::string _contentsToken;
   ZQVSmartCallback _rotation;
   ZQVDownloadSignals _signals;
+  ZQVAddressIndex _addresses;
   std::set<ZQViewerThumbnailItem*> _changed;  ///< cells that show an earlier state
   ZQVOwned<Ecore_Job, ecore_job_del> _redraw;
 };

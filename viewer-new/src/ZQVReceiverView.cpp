@@ -197,24 +197,18 @@ void ZQVReceiverView::_launchDbusMonitor() {
 
 void ZQVReceiverView::_downloadSignalCb(const char* member, const char* url) {
   const int32_t status = ZQVDownloadSignals::statusOf(member);
-  const Eina_List* node = nullptr;
-  void* data = nullptr;
-  EINA_LIST_FOREACH(_items, node, data) {
-    auto* item = static_cast<ZQViewerThumbnailItem*>(data);
-    Elm_Object_Item* cell = item ? item->gridItems[ZQV_VIEW_RECEIVER] : nullptr;
-    if (!cell || g_strcmp0(item->downloadUrl, url) != 0) continue;
-    if (item->downloadStatus != status) {
-      item->downloadStatus = status;
-      zqvSetAccessibleName(cell, zqvCellName(*item));
-      _redrawLater(item);
-    }
-    break;
+  ZQViewerThumbnailItem* item = _addresses.find(_items, url);
+  Elm_Object_Item* cell = item ? item->gridItems[ZQV_VIEW_RECEIVER] : nullptr;
+  if (cell && item->downloadStatus != status) {
+    item->downloadStatus = status;
+    zqvSetAccessibleName(cell, zqvCellName(*item));
+    _redrawLater(item);
   }
   _updateToolbarState();
 }
 
-/// A cell is built anew, which takes its time: once for all signals that came together, or whoever
-/// sends many could keep the page from everything else.
+/// What a cell shows is built anew, which takes its time: once for all signals that came together,
+/// or whoever sends many could keep the page from everything else.
 void ZQVReceiverView::_redrawLater(ZQViewerThumbnailItem* item) {
   _changed.insert(item);
   if (!_redraw) _redraw = ZQVOwned<Ecore_Job, ecore_job_del>(ecore_job_add(_redrawCb, this));
@@ -224,7 +218,10 @@ void ZQVReceiverView::_redrawCb(void* data) {
   auto* view = static_cast<ZQVReceiverView*>(data);
   (void)view->_redraw.release();  // a job that runs frees itself
   for (const ZQViewerThumbnailItem* item : std::exchange(view->_changed, {})) {
-    if (Elm_Object_Item* cell = item->gridItems[ZQV_VIEW_RECEIVER]) elm_gengrid_item_update(cell);
+    Elm_Object_Item* cell = item->gridItems[ZQV_VIEW_RECEIVER];
+    // All fields of the cell, but not the cell: the toolkit finds a new one's place in the order of
+    // focus among all others, which takes milliseconds where there are thousands.
+    if (cell) elm_gengrid_item_fields_update(cell, nullptr, ELM_GENGRID_ITEM_FIELD_ALL);
   }
 }
 
@@ -289,16 +286,20 @@ void ZQVReceiverView::_gridDeletedCb(void* data, Evas*, Evas_Object* grid, void*
 
 /// What has been downloaded can be downloaded again; only what is on its way cannot.
 void ZQVReceiverView::_updateToolbarState() {
-  bool any = false;
+  if (Evas_Object* download = _toolbarButton()) elm_object_disabled_set(download, !_isAnyToHave());
+}
+
+bool ZQVReceiverView::_isAnyToHave() const {
   const Eina_List* node = nullptr;
   void* data = nullptr;
   EINA_LIST_FOREACH(_items, node, data) {
     const auto* item = static_cast<ZQViewerThumbnailItem*>(data);
-    any = any || (item && (item->downloadStatus == ZQV_NOT_DOWNLOADED ||
-                           item->downloadStatus == ZQV_DOWNLOADED));
+    if (item &&
+        (item->downloadStatus == ZQV_NOT_DOWNLOADED || item->downloadStatus == ZQV_DOWNLOADED)) {
+      return true;
+    }
   }
-  Evas_Object* download = _toolbarButton();
-  if (download) elm_object_disabled_set(download, !any);
+  return false;
 }
 
 void ZQVReceiverView::_updateCells() {
