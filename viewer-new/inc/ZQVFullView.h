@@ -7,6 +7,7 @@
 
 #include "ZQVDownloadSignals.h"
 #include "ZQVItemGrid.h"
+#include "ZQVNeighbourPictures.h"
 #include "ZQVSmartCallback.h"
 #include "ZQVTimer.h"
 #include "ZQVWeakObject.h"
@@ -48,6 +49,7 @@ class ZQVFullView : public app_assist::WContentViewController {
   void _setUpPager();
   static void _resizedCb(void* data, Evas* canvas, Evas_Object* pager, void* info);
   void _fitPages();
+  Elm_Object_Item* _currentCell() const;
   void _showCurrentPage();
   void _createTitleIcon(Elm_Object_Item* item);
   void _showTitleIcon(const char** frames);
@@ -70,6 +72,7 @@ class ZQVFullView : public app_assist::WContentViewController {
   std::string _sender;
   std::string _token;
   ZQVItemGrid _grid;
+  ZQVNeighbourPictures _neighbours;
   ZQViewerThumbnailItem* _passedItem = nullptr;
   ZQViewerThumbnailItem* _curItem = nullptr;
   ZQViewerThumbnailItem* _markedItem = nullptr;

@@ -12,4 +12,9 @@ class ZQVPictureGate {
   /// Only the header of the file is read. A refusal is logged with its reason; a file that does not
   /// exist and a null path are refused silently.
   static bool passes(const char* path, Use use);
+
+  /// Can its loader decode it at a fraction of its size?
+  static bool isReducible(const char* path);
+  /// May it be decoded before anybody asks to see it in full view? Nothing is logged.
+  static bool isLight(const char* path);
 };

@@ -12,6 +12,7 @@
 #include "ZQVOwned.h"
 #include "ZQVPictureButton.h"
 #include "ZQVPictureGate.h"
+#include "ZQVScreenPicture.h"
 #include "ZQVThumbItem.h"
 
 namespace {
@@ -20,7 +21,6 @@ constexpr const char* kShadow = ZQV_IMAGE_DIR "zq_file_full_ic_shadow.png";
 constexpr size_t kTextBuffer = 1025;
 /// Leaves room for the tags in the label's buffer.
 constexpr size_t kLongestName = 960;
-constexpr int kPrescale = 480;
 
 bool hasPicture(const char* mimeType) {
   return zqvContains(mimeType, "video/") || zqvContains(mimeType, "image/") ||
@@ -82,6 +82,14 @@ void addFile(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* 
   for (Evas_Object* part : {icon, name, size}) common.dimObject(part);
 }
 
+/// The page that the pager opens with comes with its picture; turning a page waits for none.
+ZQVScreenPicture::First firstOn(Evas_Object* pager) {
+  Eina_List* pages = elm_gengrid_realized_items_get(pager);
+  const bool isOpening = pages == nullptr;
+  eina_list_free(pages);
+  return isOpening ? ZQVScreenPicture::First::AtOnce : ZQVScreenPicture::First::WhenDecoded;
+}
+
 Evas_Object* addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
   auto& common = ZQViewerCommon::getInstance();
   const ZQVOwnedText path = pictureOf(item);
@@ -89,10 +97,12 @@ Evas_Object* addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Ev
   const bool isDefault = g_strcmp0(path.get(), ZQV_LARGE_IMG_ICON) == 0 ||
                          g_strcmp0(path.get(), ZQV_LARGE_UNKNOWN_ICON) == 0;
   elm_object_part_content_set(layout, isDefault ? "default_thumbnail" : "thumbnail", picture);
-  elm_image_prescale_set(picture, kPrescale);
+  elm_image_prescale_set(picture, ZQVScreenPicture::kFirstSize);
   if (elm_image_animated_available_get(picture)) {
     elm_image_animated_set(picture, EINA_TRUE);
     elm_image_animated_play_set(picture, EINA_TRUE);
+  } else if (path && !isDefault) {
+    ZQVScreenPicture::follow(picture, path.get(), grid, firstOn(grid));
   }
   if (isDimmed(item, grid)) common.dimObject(picture);
   return picture;

@@ -191,6 +191,7 @@ void ZQVFullView::_scrollCb(void* data, Evas_Object* pager, void*) {
   view->_currentPage = page;
   view->_curItem = view->_itemOfPage(page);
   view->_updateDownloadedStatus();
+  view->_neighbours.lookAround(view->_currentCell());
 }
 
 void ZQVFullView::_rotateCb(void* data, Evas_Object*, void*) {
@@ -240,6 +241,7 @@ bool ZQVFullView::_delayerSetSize(void* data) {
   Eina_Bool isVerticalSnap = EINA_FALSE;
   elm_scroller_page_snap_get(pager, nullptr, &isVerticalSnap);
   elm_scroller_page_snap_set(pager, EINA_TRUE, isVerticalSnap);
+  view->_neighbours.lookAround(view->_currentCell());
   return false;
 }
 
@@ -286,8 +288,12 @@ void ZQVFullView::_fitPages() {
   _delayer.start(kSettleTime, [this] { return _delayerSetSize(this); });
 }
 
+Elm_Object_Item* ZQVFullView::_currentCell() const {
+  return _curItem ? _curItem->gridItems[_grid.getViewType()] : nullptr;
+}
+
 void ZQVFullView::_showCurrentPage() {
-  Elm_Object_Item* cell = _curItem ? _curItem->gridItems[_grid.getViewType()] : nullptr;
+  Elm_Object_Item* cell = _currentCell();
   if (!cell) return;
   // With snapping on, the pager would move by one page only.
   elm_scroller_page_snap_set(_grid.get(), EINA_FALSE, EINA_FALSE);

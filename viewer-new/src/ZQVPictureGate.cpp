@@ -13,6 +13,7 @@ namespace {
 
 constexpr uint32_t kLongestSide = 8192;
 constexpr uint64_t kMostPixels = 40000000;
+constexpr uint64_t kMostLightPixels = 4000000;
 constexpr uint64_t kMostReducedPixels = 200000000;
 constexpr off_t kLargestThumbnail = 8 << 20;
 /// A JPEG file may carry this many blocks (embedded profiles, notes) before its size.
@@ -164,4 +165,17 @@ bool ZQVPictureGate::passes(const char* path, Use use) {
   const char* reason = *path == '/' ? refusalOf(file, use) : "not an absolute path";
   if (reason) ZQV_ERROR("picture refused, %s: %s", reason, path);
   return reason == nullptr;
+}
+
+bool ZQVPictureGate::isReducible(const char* path) {
+  const OpenFile file(path);
+  PictureSize size;
+  return file.isOpen() && readSize(file, &size) && size.reducible;
+}
+
+bool ZQVPictureGate::isLight(const char* path) {
+  const OpenFile file(path);
+  PictureSize size;
+  if (!file.isOpen() || refusalOf(file, FullView) || !readSize(file, &size)) return false;
+  return size.reducible || static_cast<uint64_t>(size.width) * size.height <= kMostLightPixels;
 }
