@@ -12,7 +12,7 @@ namespace {
 
 constexpr double kMissing = -1;
 
-void readColour(const xmlNode* node, ColourTable::Colours& colours) {
+void readColour(const TableFile::Element& node, ColourTable::Colours& colours) {
   const std::string id = TableFile::text(node, "id");
   const double hue = TableFile::number(node, "hue", 0, 360, kMissing);
   const double saturation = TableFile::number(node, "saturation", 0, 100, kMissing);
@@ -42,11 +42,11 @@ std::unique_ptr<ColourTable> ColourTable::read(const char* path) {
   const auto file = TableFile::read(path, "ChangeableColorTables");
   if (!file) return nullptr;
   auto table = std::make_unique<ColourTable>();
-  TableFile::forEach(file->root(), "ChangeableColorTable", [&](const xmlNode* part) {
-    TableFile::forEach(part, "Theme", [&](const xmlNode* theme) {
+  TableFile::forEach(file->root(), "ChangeableColorTable", [&](const TableFile::Element& part) {
+    TableFile::forEach(part, "Theme", [&](const TableFile::Element& theme) {
       Colours& colours = TableFile::text(theme, "style") == "Dark" ? table->_dark : table->_light;
       TableFile::forEach(theme, "ChangeableColorInfo",
-                         [&](const xmlNode* node) { readColour(node, colours); });
+                         [&](const TableFile::Element& node) { readColour(node, colours); });
     });
   });
   return table;

@@ -28,7 +28,7 @@ std::unique_ptr<FontTable> FontTable::read(const char* path) {
   const auto file = TableFile::read(path, "FontInfoTable");
   if (!file) return nullptr;
   auto table = std::make_unique<FontTable>();
-  TableFile::forEach(file->root(), "FontInfo", [&](const xmlNode* node) {
+  TableFile::forEach(file->root(), "FontInfo", [&](const TableFile::Element& node) {
     const std::string id = TableFile::text(node, "id");
     const std::string typeface = TableFile::text(node, "typeface");
     const int size = static_cast<int>(TableFile::number(node, "size", 1, kMaxSize, 0));

@@ -1,37 +1,39 @@
-/// An XML table of the application, read with care: no network, no document type, limited size.
+/// An XML table of the application, read with care: no document type, limited size and depth.
 #pragma once
 
-#include <libxml/tree.h>
-
 #include <functional>
+#include <map>
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace theme {
 
 class TableFile {
  public:
+  struct Element {
+    std::string name;
+    std::map<std::string, std::string> attributes;
+    std::vector<Element> children;
+  };
+
   /// Null, with a log line, when the file is no table with this root element.
   static std::unique_ptr<TableFile> read(const char* path, const char* root);
-  ~TableFile();
-  TableFile(const TableFile&) = delete;
-  TableFile& operator=(const TableFile&) = delete;
 
-  const xmlNode* root() const { return _root; }
+  const Element& root() const { return _root; }
 
-  static void forEach(const xmlNode* parent, const char* name,
-                      const std::function<void(const xmlNode*)>& visit);
+  static void forEach(const Element& parent, const char* name,
+                      const std::function<void(const Element&)>& visit);
   /// Empty without the attribute.
-  static std::string text(const xmlNode* node, const char* attribute);
+  static std::string text(const Element& element, const char* attribute);
   /// `missing` when there is no number between the limits.
-  static double number(const xmlNode* node, const char* attribute, double low, double high,
+  static double number(const Element& element, const char* attribute, double low, double high,
                        double missing);
 
  private:
-  TableFile(xmlDoc* document, xmlNode* root) : _document(document), _root(root) {}
+  explicit TableFile(Element root) : _root(std::move(root)) {}
 
-  xmlDoc* const _document;
-  xmlNode* const _root;
+  const Element _root;
 };
 
 }  // namespace theme
