@@ -1,11 +1,9 @@
-#include <base/Fault.h>
-
 #include <memory>
 #include <string>
 
 #include "ServiceClient.h"
 #include "ShareBook.h"
-#include "zelqo.h"
+#include "transfers.h"
 #include "zelqo/PhoneSettings.h"
 
 namespace {
@@ -51,8 +49,7 @@ class Recall {
 
 }  // namespace
 
-int zelqo_recall_upload(unsigned int request_id, zelqo_recall_cb callback, void* user_data) {
-  if (base::strikes(__func__)) return ZELQO_ERROR_STORE;
+int zelqo_transfer_recall(unsigned int request_id, zelqo_recall_cb callback, void* user_data) {
   if (!callback) return ZELQO_ERROR_INVALID_PARAMETER;
   zelqo::Store& store = zelqo::ShareBook::instance().store();
   const auto share = store.sent(request_id);

@@ -1,11 +1,10 @@
-#include <base/Fault.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include <utility>
 
 #include "Downloader.h"
-#include "zelqo.h"
+#include "transfers.h"
 
 namespace {
 
@@ -22,9 +21,8 @@ std::string withoutTrailingSlash(std::string folder) {
 
 }  // namespace
 
-int zelqo_request_download(const char** urls, unsigned int count, const char* folder, int priority,
-                           int flags, zelqo_download_cb callback, void* user_data) {
-  if (base::strikes(__func__)) return ZELQO_ERROR_STORE;
+int zelqo_transfer_download(const char** urls, unsigned int count, const char* folder, int priority,
+                            int flags, zelqo_download_cb callback, void* user_data) {
   if (!urls || count == 0 || priority < 0 || flags != 0 || !callback) {
     return ZELQO_ERROR_INVALID_PARAMETER;
   }
