@@ -48,6 +48,26 @@ void applyMessagesOnly(const std::string& locale) {
   elm_language_set("C.UTF-8");
 }
 
+/// That of the settings, else that of the environment.
+std::string wantedLocale() {
+  const OwnedPlainText setting(vconf_get_str(VCONFKEY_LANGSET));
+  if (setting && *setting) return setting.get();
+  const char* inherited = setlocale(LC_MESSAGES, "");
+  return inherited ? inherited : "C.UTF-8";
+}
+
+/// All but the order of texts: its tables take two megabytes, and hardly any application sorts.
+bool setLocale(const char* locale) {
+  for (const int category : {LC_CTYPE, LC_NUMERIC, LC_TIME, LC_MONETARY, LC_MESSAGES}) {
+    if (!setlocale(category, locale)) return false;
+  }
+  return true;
+}
+
+void setDirection(const std::string& locale) {
+  elm_config_mirrored_set(uloc_isRightToLeft(locale.c_str()) ? EINA_TRUE : EINA_FALSE);
+}
+
 }  // namespace
 
 void Language::bindCatalogues() {
@@ -56,18 +76,27 @@ void Language::bindCatalogues() {
   if (resources) bindFolder(std::string(resources.get()) + "locale");
 }
 
-void Language::apply() {
-  const OwnedPlainText setting(vconf_get_str(VCONFKEY_LANGSET));
-  const char* inherited = setlocale(LC_ALL, "");
-  std::string locale = setting && *setting.get() ? setting.get() : "";
-  if (locale.empty()) locale = inherited ? setlocale(LC_MESSAGES, nullptr) : "C.UTF-8";
-  if (setlocale(LC_ALL, locale.c_str())) {
+void Language::begin() {
+  const std::string locale = wantedLocale();
+  if (setLocale(locale.c_str())) {
+    unsetenv("LANGUAGE");
+    evas_language_reinit();
+    edje_language_set(locale.c_str());
+  } else {
+    applyMessagesOnly(locale);
+  }
+  setDirection(locale);
+}
+
+void Language::change() {
+  const std::string locale = wantedLocale();
+  if (setLocale(locale.c_str())) {
     unsetenv("LANGUAGE");
     elm_language_set(locale.c_str());
   } else {
     applyMessagesOnly(locale);
   }
-  elm_config_mirrored_set(uloc_isRightToLeft(locale.c_str()) ? EINA_TRUE : EINA_FALSE);
+  setDirection(locale);
 }
 
 }  // namespace app_assist

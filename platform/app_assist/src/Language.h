@@ -9,9 +9,10 @@ class Language {
  public:
   /// Every catalogue under the application's resources, and the platform's own.
   static void bindCatalogues();
-  /// The language of the settings, else that of the environment. All texts that know their message
-  /// id follow, in every open window.
-  static void apply();
+  /// The language of the settings, else that of the environment; before there is a window.
+  static void begin();
+  /// All texts that know their message id follow, in every open window.
+  static void change();
 };
 
 }  // namespace app_assist

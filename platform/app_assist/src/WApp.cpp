@@ -139,7 +139,7 @@ bool WApp::Private::setUpToolkit() {
   installGlibBridge();
   followSettings(true);
   Language::bindCatalogues();
-  Language::apply();
+  Language::begin();
   DeviceTheme::install();
   return true;
 }
@@ -189,7 +189,7 @@ void WApp::Private::refreshLater() {
 
 void WApp::Private::languageCb(keynode_t*, void* data) {
   const bool wasMirrored = elm_config_mirrored_get();
-  Language::apply();
+  Language::change();
   const auto* self = static_cast<Private*>(data);
   Evas_Object* window = self->window ? self->window->getEvasObj() : nullptr;
   if (window && elm_config_mirrored_get() != wasMirrored) layOutListsAgain(window);

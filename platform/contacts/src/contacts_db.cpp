@@ -3,6 +3,7 @@
 #include <contacts.h>
 
 #include <algorithm>
+#include <clocale>
 #include <memory>
 
 #include "Filter.h"
@@ -104,7 +105,9 @@ bool comesBefore(const contacts_record_s& one, const contacts_record_s& other,
   return first && !second;  // what has no text comes last
 }
 
+/// The order is that of the language; applications have it only when they ask for it.
 void sortRecords(Records& records, const std::pair<unsigned int, bool>& sort) {
+  setlocale(LC_COLLATE, setlocale(LC_MESSAGES, nullptr));
   std::stable_sort(records.begin(), records.end(), [&](const Record& one, const Record& other) {
     return sort.second ? comesBefore(*one, *other, sort.first)
                        : comesBefore(*other, *one, sort.first);

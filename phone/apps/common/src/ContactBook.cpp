@@ -4,6 +4,7 @@
 #include <glib.h>
 
 #include <algorithm>
+#include <clocale>
 #include <memory>
 #include <type_traits>
 
@@ -95,6 +96,8 @@ std::vector<ContactBook::Entry> ContactBook::all() const {
   for (auto& entry : entries) {
     if (entry.name.empty()) entry.name = entry.number;
   }
+  // An application has the order of its language only when it asks for it.
+  setlocale(LC_COLLATE, setlocale(LC_MESSAGES, nullptr));
   std::sort(entries.begin(), entries.end(), [](const Entry& left, const Entry& right) {
     const int order = g_utf8_collate(left.name.c_str(), right.name.c_str());
     return order != 0 ? order < 0 : left.number < right.number;
