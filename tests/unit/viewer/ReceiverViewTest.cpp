@@ -296,6 +296,15 @@ class DownloadSignals : public ReceiverView {
   bool waitForStatus(size_t file, int status) {
     return waitUntil([&] { return items[file].downloadStatus == status; });
   }
+  /// The picture that tells the state of the download, null without one.
+  Evas_Object* mark(size_t file) {
+    Evas_Object* cell = elm_object_item_part_content_get(items[file].gridItems[ZQV_VIEW_RECEIVER],
+                                                         "elm.swallow.icon");
+    return cell ? elm_object_part_content_get(cell, "downstatus") : nullptr;
+  }
+  bool waitForMark(size_t file) {
+    return waitUntil([&] { return mark(file) != nullptr; });
+  }
 
  private:
   GDBusConnection* _bus;
@@ -311,6 +320,23 @@ TEST_F(DownloadSignals, FollowADownloadInItsCell) {
   emit("file_downloaded", items[1].downloadUrl);
   EXPECT_TRUE(waitForStatus(1, ZQV_DOWNLOADED));
   EXPECT_EQ(items[0].downloadStatus, ZQV_NOT_DOWNLOADED);
+}
+
+TEST_F(DownloadSignals, DrawTheStateIntoTheCellThatIsThere) {
+  items.addCount(2);
+  show();
+  ASSERT_TRUE(waitUntil([this] {
+    return elm_object_item_part_content_get(items[1].gridItems[ZQV_VIEW_RECEIVER],
+                                            "elm.swallow.icon") != nullptr;
+  }));
+  int made = 0;
+  evas_object_smart_callback_add(
+      grid(), "realized", [](void* count, Evas_Object*, void*) { ++*static_cast<int*>(count); },
+      &made);
+  emit("file_downloading", items[1].downloadUrl);
+  EXPECT_TRUE(waitForMark(1));
+  EXPECT_EQ(mark(0), nullptr);
+  EXPECT_EQ(made, 0);
 }
 
 TEST_F(DownloadSignals, AreHeardOfTwoMembersOnly) {
