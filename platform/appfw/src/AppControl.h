@@ -11,7 +11,7 @@ struct app_control_s {
   enum class Kind { Request, Received };
 
   Kind kind = Kind::Request;
-  appfw::OwnedBundle data{bundle_create()};
+  appfw::OwnedBundle data = appfw::emptyBundle();
   /// Where a reply goes: the sender's unique name and its object for this request. Empty when none
   /// is wanted.
   std::string replyTo;

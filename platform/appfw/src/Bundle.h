@@ -41,5 +41,12 @@ struct _bundle_t {
 };
 
 namespace appfw {
+
 using OwnedBundle = common::Owned<bundle, bundle_free>;
+
+/// What the platform makes for itself never fails as an application's call may.
+inline OwnedBundle emptyBundle() {
+  return OwnedBundle(new _bundle_t);
 }
+
+}  // namespace appfw

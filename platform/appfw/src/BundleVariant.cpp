@@ -46,7 +46,7 @@ GVariant* toVariant(const bundle& contents) {
 }
 
 OwnedBundle fromVariant(GVariant* contents) {
-  OwnedBundle target(bundle_create());
+  OwnedBundle target = emptyBundle();
   // A stranger may send keys by the ten thousand: looking each up in the list would take minutes.
   std::unordered_set<std::string> known;
   GVariantIter entries;

@@ -102,7 +102,7 @@ void PendingLaunch::sent(GDBusMessage* answer, const GError* error) {
   }
   dlog_print(DLOG_ERROR, "APPFW", "launch of %s failed: %s", _name.c_str(), error->message);
   if (_events.onDelivered) _events.onDelivered(false);
-  finish(APP_CONTROL_RESULT_FAILED, OwnedBundle(bundle_create()));
+  finish(APP_CONTROL_RESULT_FAILED, emptyBundle());
 }
 
 void PendingLaunch::delivered(const char* callee) {
@@ -118,8 +118,7 @@ void PendingLaunch::delivered(const char* callee) {
 }
 
 void PendingLaunch::vanishedCb(GDBusConnection*, const char*, void* data) {
-  static_cast<PendingLaunch*>(data)->finish(APP_CONTROL_RESULT_FAILED,
-                                            OwnedBundle(bundle_create()));
+  static_cast<PendingLaunch*>(data)->finish(APP_CONTROL_RESULT_FAILED, emptyBundle());
 }
 
 void PendingLaunch::replyCb(GDBusConnection*, const char* sender, const char*, const char*,

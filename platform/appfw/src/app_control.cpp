@@ -251,7 +251,7 @@ int app_control_export_as_bundle(app_control_h app_control, bundle** data) {
   if (base::strikes(__func__)) return APP_CONTROL_ERROR_OUT_OF_MEMORY;
   if (!app_control || !data) return APP_CONTROL_ERROR_INVALID_PARAMETER;
   *data = bundle_dup(app_control->data.get());
-  return APP_CONTROL_ERROR_NONE;
+  return *data ? APP_CONTROL_ERROR_NONE : APP_CONTROL_ERROR_OUT_OF_MEMORY;
 }
 
 int app_control_create_request(bundle* data, app_control_h* app_control) {

@@ -65,7 +65,8 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
                                     void* user_data) {
   if (base::strikes(__func__)) return APP_CONTROL_ERROR_LAUNCH_FAILED;
   if (!app_control) return APP_CONTROL_ERROR_INVALID_PARAMETER;
-  appfw::OwnedBundle request(bundle_dup(app_control->data.get()));
+  const appfw::OwnedBundle request = appfw::emptyBundle();
+  request->copyFrom(*app_control->data);
   request->add(appfw::kKeyOperation, std::string(APP_CONTROL_OPERATION_DEFAULT));
   const std::string target = appfw::targetOf(*request);
   if (target.empty()) return APP_CONTROL_ERROR_APP_NOT_FOUND;

@@ -93,6 +93,7 @@ bundle* bundle_dup(bundle* b_from) {
     return nullptr;
   }
   bundle* copy = bundle_create();
+  if (!copy) return nullptr;
   copy->copyFrom(*b_from);
   return copy;
 }

@@ -5,9 +5,11 @@
 #include <appfw/CallerName.h>
 #include <appfw/Launch.h>
 #include <aul.h>
+#include <base/Fault.h>
 #include <json-glib/json-glib.h>
 
 #include <cstdio>
+#include <cstring>
 #include <map>
 
 // In place of the phone's programs: one that opens every file.
@@ -17,6 +19,17 @@ bool resolver_can_open(const char* uri) {
   return *uri == '/';
 }
 }  // namespace mime
+
+namespace {
+
+bool bundlesFail = false;
+
+}  // namespace
+
+// In place of the plan that the environment gives: bundles that cannot be made.
+bool base::strikes(const char* call) {
+  return bundlesFail && strcmp(call, "bundle_create") == 0;
+}
 
 namespace {
 
@@ -32,6 +45,7 @@ class ALaunch : public testing::Test {
   }
 
   ~ALaunch() override {
+    bundlesFail = false;
     // The next test wants a callee that is not running.
     if (!readFile(starts()).empty()) quitCallee();
     app_control_destroy(_request);
@@ -147,6 +161,24 @@ TEST_F(ALaunch, FailsWhenTheApplicationDiesWithoutAReply) {
 TEST_F(ALaunch, FailsWhenTheApplicationCannotBeStarted) {
   TestPhone::install("test.broken", "/nonexistent/program");
   app_control_set_app_id(_request, "test.broken");
+  ASSERT_EQ(send("reply"), APP_CONTROL_ERROR_NONE);
+  ASSERT_TRUE(waitForReply());
+  EXPECT_EQ(_result, APP_CONTROL_RESULT_FAILED);
+}
+
+TEST_F(ALaunch, NeedsNoBundleOfTheApplications) {
+  bundlesFail = true;
+  ASSERT_EQ(send("reply"), APP_CONTROL_ERROR_NONE);
+  ASSERT_TRUE(waitForReply());
+  EXPECT_EQ(_result, APP_CONTROL_RESULT_SUCCEEDED);
+  bundle* copy = nullptr;
+  EXPECT_EQ(app_control_export_as_bundle(_request, &copy), APP_CONTROL_ERROR_OUT_OF_MEMORY);
+  EXPECT_EQ(copy, nullptr);
+}
+
+TEST_F(ALaunch, FailsWithoutABundleOfTheApplications) {
+  bundlesFail = true;
+  TestPhone::install(kCallee, "/bin/false");
   ASSERT_EQ(send("reply"), APP_CONTROL_ERROR_NONE);
   ASSERT_TRUE(waitForReply());
   EXPECT_EQ(_result, APP_CONTROL_RESULT_FAILED);
