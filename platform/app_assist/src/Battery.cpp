@@ -18,23 +18,37 @@ common::OwnedVariant property(GDBusProxy* proxy, const char* name, const GVarian
 }  // namespace
 
 Battery::Battery(std::function<void(int)> changed)
-    : _changed(std::move(changed)), _cancellable(g_cancellable_new()) {
-  g_dbus_proxy_new_for_bus(G_BUS_TYPE_SYSTEM, G_DBUS_PROXY_FLAGS_NONE, nullptr, kService, kPath,
-                           kInterface, _cancellable, proxyReadyCb, this);
+    : _changed(std::move(changed)),
+      _cancellable(g_cancellable_new()),
+      _busReturn(base::BusKind::System, [this] { connect(); }) {
+  connect();
 }
 
 Battery::~Battery() {
   g_cancellable_cancel(_cancellable);
   g_object_unref(_cancellable);
+  dropProxy();
+}
+
+/// Over the keeper's connection: another thread that joins a silent bus would hold up everybody.
+void Battery::connect() {
+  dropProxy();
+  const common::OwnedBus bus = base::systemBus();
+  if (!bus) return;
+  g_dbus_proxy_new(bus.get(), G_DBUS_PROXY_FLAGS_NONE, nullptr, kService, kPath, kInterface,
+                   _cancellable, proxyReadyCb, this);
+}
+
+void Battery::dropProxy() {
   if (!_proxy) return;
   g_signal_handlers_disconnect_by_data(_proxy, this);
-  g_object_unref(_proxy);
+  g_clear_object(&_proxy);
 }
 
 /// A cancelled call comes back after this object is gone, so the result is looked at first.
 void Battery::proxyReadyCb(GObject*, GAsyncResult* result, void* data) {
   GError* error = nullptr;
-  GDBusProxy* proxy = g_dbus_proxy_new_for_bus_finish(result, &error);
+  GDBusProxy* proxy = g_dbus_proxy_new_finish(result, &error);
   const common::OwnedError owned(error);
   if (proxy) {
     static_cast<Battery*>(data)->setProxy(proxy);
@@ -44,6 +58,7 @@ void Battery::proxyReadyCb(GObject*, GAsyncResult* result, void* data) {
 }
 
 void Battery::setProxy(GDBusProxy* proxy) {
+  dropProxy();
   _proxy = proxy;
   g_signal_connect(proxy, "g-properties-changed", G_CALLBACK(propertiesChangedCb), this);
   report();

@@ -1,7 +1,7 @@
 /// The charge of the battery, as the power service tells it.
 #pragma once
 
-#include <common/Owned.h>
+#include <base/Bus.h>
 
 #include <functional>
 
@@ -20,12 +20,15 @@ class Battery {
   static void proxyReadyCb(GObject*, GAsyncResult* result, void* data);
   static void propertiesChangedCb(GDBusProxy*, GVariant*, const char* const*, void* data);
 
+  void connect();
+  void dropProxy();
   void setProxy(GDBusProxy* proxy);
   void report();
 
   const std::function<void(int)> _changed;
   GCancellable* const _cancellable;
   GDBusProxy* _proxy = nullptr;
+  const base::BusReturn _busReturn;
 };
 
 }  // namespace app_assist
