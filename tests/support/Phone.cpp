@@ -15,6 +15,11 @@ namespace {
 
 constexpr const char* kOwnNumber = "+821012345678";
 constexpr const char* kFriend = "+821011112222";
+/// Without a sandbox, pidof finds other phones' programs and the machine's, too; and what has ended
+/// and awaits its parent's question has no environment any more.
+constexpr const char* kOurs =
+    "ours() { for p in $(pidof \"$@\"); do "
+    "grep -qzFx \"PHONE_ID=$PHONE_ID\" /proc/$p/environ && echo $p; done 2>/dev/null; }; ";
 
 Words joined(Words first, const Words& second) {
   first.insert(first.end(), second.begin(), second.end());
@@ -98,10 +103,25 @@ void Phone::launchReceived(const std::string& token) const {
   (*this)({"launch", "received", "--token", token});
 }
 
+std::string Phone::processesOf(const Words& programs) const {
+  std::string found = command(joined({"shell", "sh", "-c",
+                                      std::string(kOurs) + "ours \"$@\" | paste -sd ' '", "sh"},
+                                     programs))
+                          .out;
+  found.erase(found.find_last_not_of('\n') + 1);
+  return found;
+}
+
+bool Phone::end(const Words& programs, const std::string& signal) const {
+  const std::string script =
+      std::string(kOurs) + "found=$(ours \"$@\"); [ \"$found\" ] || exit 1; kill -" + signal +
+      " $found; "
+      "for p in $found; do while [ -e /proc/$p/exe ]; do sleep 0.02; done; done";
+  return command(joined({"shell", "sh", "-c", script, "sh"}, programs)).status == 0;
+}
+
 void Phone::closeViewer() const {
-  (*this)({"shell", "sh", "-c",
-           "p=$(pidof zelqo-viewer) || exit 0; kill $p; "
-           "while [ -e /proc/$p/exe ]; do sleep 0.02; done"});
+  end({"zelqo-viewer"});
 }
 
 std::string Phone::sanitizerFindings() const {

@@ -47,6 +47,11 @@ class Phone {
                 const Words& options = {}) const;
   void launchReceived(const std::string& token) const;
 
+  /// The processes of programs of this phone, parted by blanks; of no other phone's and not the
+  /// machine's, which share their names where there is no sandbox. Empty when there is none.
+  std::string processesOf(const Words& programs) const;
+  /// Ends them and returns when they have gone. False when there was none.
+  bool end(const Words& programs, const std::string& signal = "TERM") const;
   /// Ends the viewer, so that the next test finds the phone as after its start.
   void closeViewer() const;
 

@@ -78,7 +78,7 @@ size_t filesIn(const std::string& folder) {
 }
 
 std::string viewerProcess() {
-  return thePhone().command({"shell", "pidof", "zelqo-viewer"}).out;
+  return thePhone().processesOf({"zelqo-viewer"});
 }
 
 testing::AssertionResult cellShows(const std::string& name, const Colour& colour) {

@@ -13,7 +13,7 @@ class Opening : public testing::Test {
  protected:
   void TearDown() override {
     thePhone().closeViewer();
-    thePhone()({"shell", "sh", "-c", "p=$(pidof l3afpad gpicview) && kill $p; true"});
+    thePhone().end({"l3afpad", "gpicview"});
   }
 
   static std::string put(const std::string& name, const std::string& content) {

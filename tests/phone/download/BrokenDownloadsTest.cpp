@@ -33,8 +33,8 @@ class BrokenDownload : public DownloadPage {
 
   /// The download application can write no larger files from now on.
   static void limitFiles(const std::string& bytes) {
-    thePhone()(
-        {"shell", "sh", "-c", "prlimit --fsize=" + bytes + ": --pid=$(pidof download-manager)"});
+    thePhone()({"shell", "prlimit", "--fsize=" + bytes + ":",
+                "--pid=" + thePhone().processesOf({"download-manager"})});
   }
 
   static bool isWhole(const std::string& name) {

@@ -21,7 +21,7 @@ class FileNames : public DownloadPage {
  protected:
   void TearDown() override {
     DownloadPage::TearDown();
-    thePhone()({"shell", "sh", "-c", "p=$(pidof l3afpad) && kill $p; true"});
+    thePhone().end({"l3afpad"});
   }
 
   /// A share of files of these names, written as JSON, each with bytes of its own.

@@ -150,7 +150,5 @@ size_t Gate::_mayPass(size_t bytes) {
 }
 
 void killDownloadApplication() {
-  thePhone()({"shell", "sh", "-c",
-              "p=$(pidof download-manager) || exit 0; kill -9 $p; "
-              "while kill -0 $p 2>/dev/null; do sleep 0.02; done"});
+  thePhone().end({"download-manager"}, "KILL");
 }

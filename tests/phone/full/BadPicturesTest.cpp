@@ -31,7 +31,7 @@ Words badPictures() {
 }
 
 std::string viewer() {
-  return thePhone()({"shell", "pidof", "zelqo-viewer"});
+  return thePhone().processesOf({"zelqo-viewer"});
 }
 
 bool showsSomething() {

@@ -132,8 +132,7 @@ testing::AssertionResult download() {
 }
 
 bool closePrograms() {
-  const char* end = "p=$(pidof gpicview l3afpad mpv zathura) && kill $p";
-  return thePhone().command({"shell", "sh", "-c", end}).status == 0;
+  return thePhone().end({"gpicview", "l3afpad", "mpv", "zathura"});
 }
 
 size_t countOf(const std::string& text, const std::string& part) {

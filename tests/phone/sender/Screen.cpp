@@ -72,9 +72,7 @@ testing::AssertionResult shows(const Phone& phone, std::size_t cells) {
 }
 
 testing::AssertionResult viewerEnds(const Phone& phone) {
-  return result(phone, waitFor([&] {
-                  return phone.command({"shell", "pidof", "zelqo-viewer"}).status != 0;
-                }),
+  return result(phone, waitFor([&] { return phone.processesOf({"zelqo-viewer"}).empty(); }),
                 "the viewer runs");
 }
 
