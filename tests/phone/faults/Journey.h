@@ -1,0 +1,35 @@
+/// The main ways through the viewer, as fingers go them: receive, page, download, open, recall,
+/// reshare. Touches places, whatever is there by then.
+#pragma once
+
+#include <string>
+
+#include "LoopWatch.h"
+#include "Phone.h"
+
+class Journey {
+ public:
+  /// Shares what is needed.
+  Journey();
+
+  /// All ways, one after the other. False when the viewer once neither answered nor ended.
+  bool go(LoopWatch& watch) const;
+
+  const phone::Share& received() const { return _received; }
+  const phone::Share& sent() const { return _sent; }
+
+ private:
+  phone::Share _received, _sent;
+};
+
+/// Where things are on the viewer's pages.
+namespace place {
+constexpr const char* kFirstCell = "90,366";
+constexpr const char* kBottomButton = "360,1212";  // Download, Open
+constexpr const char* kSelectAll = "360,215";
+constexpr const char* kDone = "636,103";
+constexpr const char* kRecall = "194,1212";
+constexpr const char* kReshare = "526,1212";
+constexpr const char* kOk = "552,1212";
+constexpr const char* kCancel = "188,1212";
+}  // namespace place
