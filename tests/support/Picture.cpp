@@ -6,6 +6,7 @@
 #include <cstdlib>
 #include <memory>
 #include <ostream>
+#include <vector>
 
 namespace phone {
 namespace {
@@ -53,6 +54,47 @@ std::string makePicture(const Phone& phone, const std::string& name, const Colou
   return path;
 }
 
+std::string makeStripes(const Phone& phone, const std::string& name) {
+  constexpr int kWidth = 4000;
+  constexpr int kHeight = 3000;
+  constexpr int kPeriod = 13;
+  const std::string path = phone.makeFile(name, 0);
+  const Picture picture(gdk_pixbuf_new(GDK_COLORSPACE_RGB, FALSE, kBitsPerSample, kWidth, kHeight));
+  gdk_pixbuf_fill(picture.get(), 0xffffffff);
+  for (int x = 0; x + kPeriod <= kWidth; x += kPeriod) {
+    const Picture stripe(gdk_pixbuf_new_subpixbuf(picture.get(), x, 0, kPeriod / 2, kHeight));
+    gdk_pixbuf_fill(stripe.get(), 0x000000ff);
+  }
+  EXPECT_TRUE(gdk_pixbuf_save(picture.get(), path.c_str(), "jpeg", nullptr, nullptr));
+  return path;
+}
+
+std::string makeAnimation(const Phone& phone, const std::string& name) {
+  const std::string path = phone.makeFile(name, 0);
+  const bool isGif = endsWith(name, ".gif");
+  const std::string frames = std::string(
+                                 "color=red:s=400x300:r=2:d=1[red];"
+                                 "color=blue:s=400x300:r=2:d=1[blue];"
+                                 "[red][blue]concat=n=2,format=") +
+                             (isGif ? "rgb8" : "yuv420p");
+  const std::vector<const char*> command = {"ffmpeg",
+                                            "-v",
+                                            "error",
+                                            "-y",
+                                            "-filter_complex",
+                                            frames.c_str(),
+                                            "-c:v",
+                                            isGif ? "gif" : "libwebp_anim",
+                                            "-loop",
+                                            "0",
+                                            path.c_str(),
+                                            nullptr};
+  EXPECT_TRUE(g_spawn_sync(nullptr, const_cast<char**>(command.data()), nullptr,
+                           G_SPAWN_SEARCH_PATH, nullptr, nullptr, nullptr, nullptr, nullptr,
+                           nullptr));
+  return path;
+}
+
 std::string pngHeader(unsigned width, unsigned height) {
   std::string bytes("\x89PNG\r\n\x1a\n\0\0\0\rIHDR", 16);
   append32(bytes, width);
@@ -78,6 +120,18 @@ std::string pixelsOf(const Phone& phone, const Area& area) {
                   static_cast<size_t>(area.width) * static_cast<size_t>(perPixel));
   }
   return pixels;
+}
+
+int contrastIn(const Phone& phone, const Area& row) {
+  const std::string pixels = pixelsOf(phone, row);
+  if (pixels.empty()) return 0;
+  const size_t perPixel = pixels.size() / static_cast<size_t>(row.width);
+  int differences = 0;
+  for (size_t i = perPixel; i < pixels.size(); i += perPixel) {
+    differences += std::abs(static_cast<unsigned char>(pixels[i]) -
+                            static_cast<unsigned char>(pixels[i - perPixel]));
+  }
+  return differences / row.width;
 }
 
 Colour colourAt(const Phone& phone, int x, int y) {

@@ -151,6 +151,18 @@ TEST_F(PictureGate, StaysShutForARelativePath) {
   EXPECT_EQ(errors(), Errors({"picture refused, not an absolute path: picture.png"}));
 }
 
+TEST_F(PictureGate, KnowsWhichPicturesMayBeDecodedAhead) {
+  const auto isLight = [this](const std::string& content) {
+    return ZQVPictureGate::isLight(file(content).c_str());
+  };
+  EXPECT_TRUE(isLight(jpeg(12000, 9000)));
+  EXPECT_TRUE(isLight(png(2000, 2000)));
+  EXPECT_FALSE(isLight(png(2001, 2000)));
+  EXPECT_FALSE(isLight(jpeg(20000, 10001)));
+  EXPECT_FALSE(isLight("words"));
+  EXPECT_FALSE(ZQVPictureGate::isLight("/nowhere.jpg"));
+}
+
 TEST_F(PictureGate, IsSilentAboutWhatIsNotThere) {
   EXPECT_FALSE(ZQVPictureGate::passes(nullptr, ZQVPictureGate::Thumbnail));
   EXPECT_FALSE(ZQVPictureGate::passes("", ZQVPictureGate::Thumbnail));
