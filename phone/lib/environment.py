@@ -28,6 +28,7 @@ def phone(state, home, run, language):
         "ELM_PROFILE": "mobile", "ELM_ATSPI_MODE": "1",
         "EINA_LOG_BACKTRACE": "-1", "EINA_LOG_LEVELS": ",".join(_QUIET),
         "XDG_CURRENT_DESKTOP": "phone",
+        "FONTCONFIG_FILE": os.path.join(ROOT, "phone", "etc", "fonts.conf"),
         # the phone's choice of programs for files stands before the machine's
         "XDG_DATA_DIRS": "/opt/usr/share:/usr/local/share:/usr/share",
     }
