@@ -18,6 +18,7 @@
 #include "LateDestroyer.h"
 #include "ListLayout.h"
 #include "MarkupRefresh.h"
+#include "MemoryUse.h"
 #include "SettingKeys.h"
 #include "WindowPrivate.h"
 #include "app_assist/WNaviframeController.h"
@@ -137,6 +138,7 @@ bool WApp::Private::setUpToolkit() {
     return false;
   }
   installGlibBridge();
+  limitMemoryUse();
   followSettings(true);
   Language::bindCatalogues();
   Language::begin();

@@ -176,6 +176,19 @@ TEST_F(App, FitsItsScaleToTheScreen) {
   EXPECT_NEAR(scale, 2.6 * width / 720, 0.001);
 }
 
+TEST_F(App, KeepsLittleOfWhatIsNoLongerShown) {
+  int pictures = 0;
+  app.atCreate = [&] {
+    pictures = evas_image_cache_get(evas_object_evas_get(app.getWindowController()->getEvasObj()));
+    launchMyself("op");
+  };
+  run();
+  constexpr int kMegabyte = 1024 * 1024;
+  EXPECT_LE(pictures, kMegabyte);
+  EXPECT_GT(pictures, kMegabyte / 4);
+  EXPECT_LE(eina_freeq_mem_max_get(eina_freeq_main_get()), static_cast<size_t>(kMegabyte));
+}
+
 TEST_F(App, SpeaksTheNewLanguageBeforeTheApplicationHearsOfIt) {
   static std::string heard;
   heard.clear();
