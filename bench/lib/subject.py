@@ -29,7 +29,7 @@ class Subject:
     """A phone with a state folder of its own, which a run begins anew."""
 
     def __init__(self):
-        self.folder = os.path.join(BUILD, "phone")
+        self.folder = os.path.join(BUILD, "subject")
         self.work = os.path.join(BUILD, "work")
         os.makedirs(self.work, exist_ok=True)
         os.environ["PHONE_BUILD"] = BUILD
