@@ -1,10 +1,13 @@
 #include <common/Database.h>
+#include <fcntl.h>
+#include <unistd.h>
 
 namespace common {
 namespace {
 
-constexpr int kBusyTimeoutMs = 3000;
-constexpr int kWalTries = 200;
+/// Less than a second, after which a person takes the application that waits for dead.
+constexpr int kBusyTimeoutMs = 800;
+constexpr int kWalTries = 100;
 constexpr gulong kWalPauseUs = 5000;
 
 void logFailure(sqlite3* handle, const char* what) {
@@ -23,6 +26,11 @@ bool switchToWal(sqlite3* handle) {
 }
 
 }  // namespace
+
+void makePrivateFile(const std::string& path) {
+  const int file = ::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, S_IRUSR | S_IWUSR);
+  if (file >= 0) close(file);
+}
 
 Statement::~Statement() {
   if (!_statement) return;
@@ -90,6 +98,7 @@ std::optional<std::int64_t> Statement::optionalNumber(int column) const {
 }
 
 std::unique_ptr<Database> Database::open(const std::string& path, const char* schema) {
+  makePrivateFile(path);
   sqlite3* handle = nullptr;
   const int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE;
   const bool opened = sqlite3_open_v2(path.c_str(), &handle, flags, nullptr) == SQLITE_OK;

@@ -21,6 +21,7 @@ def install(state, build):
             _mirror(os.path.join(source, owned), os.path.join(application.path, owned), prune=True)
         for folder in ("data", "shared/data"):
             os.makedirs(os.path.join(application.path, folder), exist_ok=True)
+        os.chmod(os.path.join(application.path, "data"), 0o700)
     _announce(state)
 
 

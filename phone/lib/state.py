@@ -29,6 +29,7 @@ class State:
         try:
             for folder in _FOLDERS:
                 os.makedirs(self.path(folder), exist_ok=True)
+            os.chmod(self.path("opt-usr/dbspace"), 0o700)
         except OSError as error:
             raise Failure(f"cannot use {self.folder}: {error.strerror}") from None
 

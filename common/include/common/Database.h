@@ -13,6 +13,10 @@
 
 namespace common {
 
+/// Makes an empty file that is its owner's alone, when there is none: SQLite keeps its mode, and
+/// gives it to the files beside it.
+void makePrivateFile(const std::string& path);
+
 /// One execution of a prepared statement, reset when the use of it ends: bind in order, then step
 /// or run.
 class Statement {
@@ -49,7 +53,7 @@ class Statement {
 
 class Database {
  public:
-  /// Opens or creates the file and runs `schema`, which must be harmless on an existing database.
+  /// Opens or creates the file, for its owner only, and runs `schema`, which must be harmless on an existing database.
   /// Null, with a line on the log, when that fails.
   static std::unique_ptr<Database> open(const std::string& path, const char* schema);
   Database(const Database&) = delete;

@@ -62,9 +62,9 @@ std::string line(const bundle& request) {
 
 void recordLaunch(const bundle& request) {
   const std::string folder = base::databaseFolder();
-  g_mkdir_with_parents(folder.c_str(), 0755);
+  g_mkdir_with_parents(folder.c_str(), 0700);
   const int fd =
-      open((folder + "/launches.jsonl").c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
+      open((folder + "/launches.jsonl").c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0600);
   if (fd < 0) return;
   const std::string text = line(request);
   [[maybe_unused]] const ssize_t written = write(fd, text.data(), text.size());

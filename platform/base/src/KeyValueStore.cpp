@@ -28,7 +28,7 @@ KeyValueStore::~KeyValueStore() = default;
 
 int KeyValueStore::connect(bool create) {
   if (_connection) return SQLITE_OK;
-  if (create) g_mkdir_with_parents(folderOf(_path).c_str(), 0755);
+  if (create) g_mkdir_with_parents(folderOf(_path).c_str(), 0700);
   auto connection = std::make_unique<StoreConnection>();
   const int code = connection->open(_path, create);
   if (code == SQLITE_OK) _connection = std::move(connection);

@@ -1,9 +1,13 @@
 #include "StoreConnection.h"
 
+#include <common/Database.h>
 #include <unistd.h>
 
 namespace base {
 namespace {
+
+/// A write takes a millisecond or two. Who keeps the file for longer hangs, and others must not.
+constexpr int kPatienceMs = 500;
 
 /// A statement is reset after every use: a stepped one holds its read lock.
 class Use {
@@ -35,12 +39,13 @@ std::string columnText(sqlite3_stmt* statement, int column) {
 }  // namespace
 
 int StoreConnection::open(const std::string& path, bool create) {
+  if (create) common::makePrivateFile(path);
   sqlite3* db = nullptr;
   const int flags = SQLITE_OPEN_READWRITE | (create ? SQLITE_OPEN_CREATE : 0);
   int code = sqlite3_open_v2(path.c_str(), &db, flags, nullptr);
   _db.reset(db);
   if (code != SQLITE_OK) return code;
-  sqlite3_busy_timeout(db, 3000);
+  sqlite3_busy_timeout(db, kPatienceMs);
   if ((code = switchToWal()) != SQLITE_OK) return code;
   if ((code = execute("PRAGMA synchronous=NORMAL")) != SQLITE_OK) return code;
   code = execute("CREATE TABLE IF NOT EXISTS pref(k TEXT PRIMARY KEY, v) WITHOUT ROWID");
@@ -53,7 +58,7 @@ int StoreConnection::execute(const char* sql) {
 
 /// Two processes that make the file together collide here at once, whatever the busy timeout.
 int StoreConnection::switchToWal() {
-  constexpr int attempts = 200;
+  constexpr int attempts = 100;
   int code = SQLITE_BUSY;
   for (int i = 0; i < attempts && code == SQLITE_BUSY; i++) {
     if (i > 0) usleep(5000);

@@ -2,15 +2,12 @@
 
 #include <common/DamagedDatabase.h>
 #include <common/Owned.h>
-#include <fcntl.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace zelqo {
 namespace {
 
 constexpr mode_t kPrivate = 0700;
-constexpr mode_t kPrivateFile = 0600;
 
 constexpr char kSchema[] = R"(
 CREATE TABLE IF NOT EXISTS received(
@@ -53,9 +50,6 @@ common::Database* StoreFile::database() {
 void StoreFile::open() {
   const common::OwnedText folder(g_path_get_dirname(_path.c_str()));
   g_mkdir_with_parents(folder.get(), kPrivate);
-  // The account's key lies in it; SQLite gives its other files the mode of this one.
-  const int fd = ::open(_path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, kPrivateFile);
-  if (fd >= 0) close(fd);
   _database = common::Database::open(_path, kSchema);
   struct stat status;
   if (!_database || stat(_path.c_str(), &status) != 0) return;

@@ -1,5 +1,5 @@
 /// A persistent key-value store, shared by processes: one SQLite file. Any bytes without a zero are
-/// a key. Calls are synchronous and wait at most three seconds for another process.
+/// a key. Calls are synchronous and wait at most half a second for another process.
 #pragma once
 
 #include <cstdint>
