@@ -2,11 +2,34 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include <atomic>
+
 namespace common {
 namespace {
 
-/// Less than a second, after which a person takes the application that waits for dead.
-constexpr int kBusyTimeoutMs = 800;
+/// A write takes a millisecond or two. Who keeps a file for longer hangs, and its neighbours must
+/// not: a person takes an application that does not answer for a second for dead.
+constexpr gint64 kPatienceUs = 500000;
+/// So long after a wait in vain nobody in this process waits again.
+constexpr gint64 kImpatientUs = 2000000;
+constexpr gulong kPauseUs = 2000;
+
+/// When this process last waited in vain, and since when each thread waits.
+std::atomic<gint64> inVain{-kImpatientUs};
+thread_local gint64 waitingSince = 0;
+
+int busyCb(void*, int tries) {
+  const gint64 now = g_get_monotonic_time();
+  if (tries == 0) waitingSince = now;
+  if (now - inVain < kImpatientUs) return 0;
+  if (now - waitingSince >= kPatienceUs) {
+    inVain = now;
+    return 0;
+  }
+  g_usleep(kPauseUs);
+  return 1;
+}
+
 constexpr int kWalTries = 100;
 constexpr gulong kWalPauseUs = 5000;
 
@@ -15,7 +38,7 @@ void logFailure(sqlite3* handle, const char* what) {
 }
 
 // Two processes that create the file together: the switch to WAL fails as "locked" at once and
-// ignores the busy timeout.
+// asks nobody whether to wait.
 bool switchToWal(sqlite3* handle) {
   for (int i = 0; i < kWalTries; i++) {
     const int result = sqlite3_exec(handle, "PRAGMA journal_mode=WAL", nullptr, nullptr, nullptr);
@@ -26,6 +49,10 @@ bool switchToWal(sqlite3* handle) {
 }
 
 }  // namespace
+
+void waitBriefly(sqlite3* handle) {
+  sqlite3_busy_handler(handle, busyCb, nullptr);
+}
 
 void makePrivateFile(const std::string& path) {
   const int file = ::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, S_IRUSR | S_IWUSR);
@@ -109,7 +136,7 @@ std::unique_ptr<Database> Database::open(const std::string& path, const char* sc
 }
 
 bool Database::configure(const char* schema) {
-  sqlite3_busy_timeout(_handle.get(), kBusyTimeoutMs);
+  waitBriefly(_handle.get());
   return switchToWal(_handle.get()) && execute("PRAGMA synchronous=NORMAL") &&
          execute("PRAGMA foreign_keys=ON") && execute(schema);
 }

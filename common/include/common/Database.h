@@ -17,6 +17,10 @@ namespace common {
 /// gives it to the files beside it.
 void makePrivateFile(const std::string& path);
 
+/// For a file that another process is writing: waits half a second, and for a while not at all when
+/// that was in vain.
+void waitBriefly(sqlite3* handle);
+
 /// One execution of a prepared statement, reset when the use of it ends: bind in order, then step
 /// or run.
 class Statement {
@@ -53,8 +57,8 @@ class Statement {
 
 class Database {
  public:
-  /// Opens or creates the file, for its owner only, and runs `schema`, which must be harmless on an existing database.
-  /// Null, with a line on the log, when that fails.
+  /// Opens or creates the file, for its owner only, and runs `schema`, which must be harmless on an
+  /// existing database. Null, with a line on the log, when that fails.
   static std::unique_ptr<Database> open(const std::string& path, const char* schema);
   Database(const Database&) = delete;
   Database& operator=(const Database&) = delete;

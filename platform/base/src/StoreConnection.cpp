@@ -6,9 +6,6 @@
 namespace base {
 namespace {
 
-/// A write takes a millisecond or two. Who keeps the file for longer hangs, and others must not.
-constexpr int kPatienceMs = 500;
-
 /// A statement is reset after every use: a stepped one holds its read lock.
 class Use {
  public:
@@ -45,7 +42,7 @@ int StoreConnection::open(const std::string& path, bool create) {
   int code = sqlite3_open_v2(path.c_str(), &db, flags, nullptr);
   _db.reset(db);
   if (code != SQLITE_OK) return code;
-  sqlite3_busy_timeout(db, kPatienceMs);
+  common::waitBriefly(db);
   if ((code = switchToWal()) != SQLITE_OK) return code;
   if ((code = execute("PRAGMA synchronous=NORMAL")) != SQLITE_OK) return code;
   code = execute("CREATE TABLE IF NOT EXISTS pref(k TEXT PRIMARY KEY, v) WITHOUT ROWID");
@@ -56,7 +53,7 @@ int StoreConnection::execute(const char* sql) {
   return sqlite3_exec(_db.get(), sql, nullptr, nullptr, nullptr);
 }
 
-/// Two processes that make the file together collide here at once, whatever the busy timeout.
+/// Two processes that make the file together collide here at once, whatever their patience.
 int StoreConnection::switchToWal() {
   constexpr int attempts = 100;
   int code = SQLITE_BUSY;

@@ -1,6 +1,8 @@
 // A phone on which something is missing or wrong: room on the disk, folders that can be written,
 // files of the installation, the network's manager, the time of day.
 
+#include <common/Database.h>
+
 #include <cstdint>
 #include <filesystem>
 #include <fstream>
@@ -62,6 +64,23 @@ class Missing {
 
  private:
   const fs::path _path, _aside;
+};
+
+/// Stores of the phone in which somebody began to write and never ends, as long as this object
+/// lives.
+class Locked {
+ public:
+  explicit Locked(const std::string& folder) {
+    for (const auto& file : fs::directory_iterator(ViewerSetting::outside(folder))) {
+      if (file.path().extension() != ".db") continue;
+      _stores.push_back(common::Database::open(file.path(), ""));
+      EXPECT_TRUE(_stores.back()->execute("BEGIN IMMEDIATE")) << file.path();
+    }
+    EXPECT_FALSE(_stores.empty());
+  }
+
+ private:
+  std::vector<std::unique_ptr<common::Database>> _stores;
 };
 
 /// The time of day as the viewer sees it.
@@ -156,6 +175,18 @@ TEST_F(BadWorld, MissingTablesDoNoHarm) {
   {
     const Missing tables(std::string(kApplication) + "/shared/res/tables");
     expectSoundness();
+  }
+  expectHealth();
+}
+
+TEST_F(BadWorld, StoresThatAreLockedForeverHoldNobodyUpForASecond) {
+  ASSERT_TRUE(_journey.go(_watch));  // makes them
+  thePhone().closeViewer();
+  {
+    const Locked stores("dbspace"), preferences(std::string(kApplication) + "/data");
+    _watch.begin();
+    expectSoundness();
+    EXPECT_LE(_watch.longestWait().count(), 1000);
   }
   expectHealth();
 }
