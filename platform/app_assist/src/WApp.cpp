@@ -13,10 +13,10 @@
 #include <new>
 
 #include "DeviceTheme.h"
+#include "Direction.h"
 #include "GlibBridge.h"
 #include "Language.h"
 #include "LateDestroyer.h"
-#include "ListLayout.h"
 #include "MarkupRefresh.h"
 #include "MemoryUse.h"
 #include "SettingKeys.h"
@@ -194,7 +194,7 @@ void WApp::Private::languageCb(keynode_t*, void* data) {
   Language::change();
   const auto* self = static_cast<Private*>(data);
   Evas_Object* window = self->window ? self->window->getEvasObj() : nullptr;
-  if (window && elm_config_mirrored_get() != wasMirrored) layOutListsAgain(window);
+  if (window && elm_config_mirrored_get() != wasMirrored) followDirection(window);
 }
 
 void WApp::Private::refreshCb(void* data) {
