@@ -58,6 +58,15 @@ constexpr char kRecipients[] =
     "SELECT msisdn FROM sent_recipient WHERE request_id = ? ORDER BY position";
 constexpr char kPaths[] = "SELECT path FROM sent_file WHERE request_id = ? ORDER BY position";
 
+/// What all shares have, in columns 2 to 5.
+template <typename Share>
+void readState(Statement& row, Share& share) {
+  share.single = row.number(2) != 0;
+  share.createdMs = row.number(3);
+  share.expiresMs = row.number(4);
+  share.recalledMs = row.optionalNumber(5);
+}
+
 bool readReceived(Database& database, const std::string& token,
                   std::optional<ReceivedShare>& share) {
   Statement row = database.prepare(
@@ -68,10 +77,7 @@ bool readReceived(Database& database, const std::string& token,
     share->token = token;
     share->sender = row.text(0);
     share->base = row.text(1);
-    share->single = row.number(2) != 0;
-    share->createdMs = row.number(3);
-    share->expiresMs = row.number(4);
-    share->recalledMs = row.optionalNumber(5);
+    readState(row, *share);
   }
   return !row.failed();
 }
@@ -98,10 +104,7 @@ bool readSent(Database& database, std::int64_t requestId, std::optional<SentShar
     share->requestId = requestId;
     share->token = row.text(0);
     share->sender = row.text(1);
-    share->single = row.number(2) != 0;
-    share->createdMs = row.number(3);
-    share->expiresMs = row.number(4);
-    share->recalledMs = row.optionalNumber(5);
+    readState(row, *share);
   }
   return !row.failed();
 }
@@ -117,10 +120,7 @@ bool listReceived(Database& database, std::vector<ShareSummary>& list) {
     summary.received = true;
     summary.token = rows.text(0);
     summary.numbers = {rows.text(1)};
-    summary.single = rows.number(2) != 0;
-    summary.createdMs = rows.number(3);
-    summary.expiresMs = rows.number(4);
-    summary.recalledMs = rows.optionalNumber(5);
+    readState(rows, summary);
     summary.fileCount = rows.number(6);
     summary.firstFile = rows.text(7);
   }
@@ -138,10 +138,7 @@ bool listSent(Database& database, std::vector<ShareSummary>& list) {
     ShareSummary& summary = list.emplace_back();
     summary.token = rows.text(0);
     summary.requestId = rows.number(1);
-    summary.single = rows.number(2) != 0;
-    summary.createdMs = rows.number(3);
-    summary.expiresMs = rows.number(4);
-    summary.recalledMs = rows.optionalNumber(5);
+    readState(rows, summary);
     summary.fileCount = rows.number(6);
     summary.firstFile = rows.text(7);
     done = readTexts(database, kRecipients, summary.requestId, summary.numbers);

@@ -4,8 +4,6 @@
 
 namespace {
 
-constexpr int kPatienceSeconds = 20;
-
 GTlsCertificate* makeCertificate(const std::string& folder) {
   const std::string key = folder + "/key.pem";
   const std::string certificate = folder + "/cert.pem";
@@ -95,18 +93,4 @@ void TestServer::_sendHalf(SoupServerMessage* message, const Answer& answer) {
                      g_socket_shutdown(soup_server_message_get_socket(sent), TRUE, TRUE, nullptr);
                    }),
                    nullptr);
-}
-
-bool waitUntil(const std::function<bool()>& condition) {
-  bool isLate = false;
-  const guint source = g_timeout_add_seconds(
-      kPatienceSeconds,
-      [](gpointer late) -> gboolean {
-        *static_cast<bool*>(late) = true;
-        return G_SOURCE_CONTINUE;
-      },
-      &isLate);
-  while (!condition() && !isLate) g_main_context_iteration(nullptr, TRUE);
-  g_source_remove(source);
-  return condition();
 }

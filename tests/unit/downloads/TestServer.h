@@ -2,9 +2,10 @@
 
 #include <libsoup/soup.h>
 
-#include <functional>
 #include <map>
 #include <string>
+
+#include "WaitUntil.h"
 
 /// What the service answers for one path.
 struct Answer {
@@ -49,6 +50,3 @@ class TestServer {
   std::string _lastRange;
   std::size_t _bytesServed = 0;
 };
-
-/// Runs the main context until the condition holds; false when that takes longer than any test may.
-bool waitUntil(const std::function<bool()>& condition);

@@ -107,20 +107,6 @@ void TestPhone::install(const std::string& appId, const std::string& command) {
       "ReloadConfig", nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
 }
 
-bool waitUntil(const std::function<bool()>& condition) {
-  bool late = false;
-  const guint timer = g_timeout_add_seconds(
-      10,
-      [](void* data) -> gboolean {
-        *static_cast<bool*>(data) = true;
-        return G_SOURCE_CONTINUE;
-      },
-      &late);
-  while (!condition() && !late) g_main_context_iteration(nullptr, TRUE);
-  g_source_remove(timer);
-  return condition();
-}
-
 void settle() {
   common::OwnedBus bus = base::sessionBus();
   bool answered = false;

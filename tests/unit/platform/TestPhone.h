@@ -5,8 +5,9 @@
 #include <base/Bus.h>
 #include <gtest/gtest.h>
 
-#include <functional>
 #include <string>
+
+#include "WaitUntil.h"
 
 class TestPhone : public testing::Environment {
  public:
@@ -27,8 +28,6 @@ class TestPhone : public testing::Environment {
   static void replaceBus();
 };
 
-/// Runs the main loop until the condition holds; false when it never does.
-bool waitUntil(const std::function<bool()>& condition);
 /// Runs the main loop until everything sent so far on the shared bus has been dealt with.
 void settle();
 /// A connection of its own, as another process would have.

@@ -3,9 +3,6 @@
 #include <Elementary.h>
 #include <contacts.h>
 #include <libintl.h>
-#include <unistd.h>
-
-#include <cstdlib>
 
 using app_assist::WContentViewController;
 using app_assist::WNaviframeController;
@@ -37,21 +34,6 @@ void TestViewer::onTerminate() {
 
 WNaviframeController* TestViewer::naviframe() const {
   return static_cast<WNaviframeController*>(getWindowController()->getBaseViewController());
-}
-
-bool waitUntil(const std::function<bool()>& condition) {
-  constexpr double kPatience = 10.0;
-  const double deadline = ecore_time_get() + kPatience;
-  // The tick only wakes the loop up, so that the condition is looked at again.
-  Ecore_Timer* tick = ecore_timer_add(
-      0.01, [](void*) -> Eina_Bool { return ECORE_CALLBACK_RENEW; }, nullptr);
-  bool isTrue = condition();
-  while (!isTrue && ecore_time_get() < deadline) {
-    ecore_main_loop_iterate_may_block(1);
-    isTrue = condition();
-  }
-  ecore_timer_del(tick);
-  return isTrue;
 }
 
 std::vector<std::string> PageTest::pages() const {

@@ -2,11 +2,11 @@
 
 #include <app_assist.h>
 
-#include <functional>
 #include <string>
 #include <vector>
 
 #include "../views/Items.h"
+#include "Loop.h"
 #include "ViewerTest.h"
 #include "ZQVApp.h"
 
@@ -31,9 +31,6 @@ class TestViewer : public ZQVApp {
  private:
   int _result = 1;
 };
-
-/// Runs the main loop until the condition holds; false when it does not within some seconds.
-bool waitUntil(const std::function<bool()>& condition);
 
 /// A test with a window. Its pages end with it.
 class PageTest : public ViewerTest {

@@ -1,33 +1,14 @@
-#include <gio/gio.h>
-#include <libintl.h>
-#include <unistd.h>
-
 #include <cstdlib>
-#include <string>
 
+#include "PageProcess.h"
 #include "PageTest.h"
 
 int main(int argc, char** argv) {
-  // A system bus of its own, whatever runs around.
-  const char* screen = getenv("DISPLAY");
-  const std::string display = screen ? screen : "";
-  GTestDBus* bus = g_test_dbus_new(G_TEST_DBUS_NONE);
-  g_test_dbus_up(bus);
-  // The test bus forgets the screen, too.
-  setenv("DISPLAY", display.c_str(), 1);
-  setenv("DBUS_SYSTEM_BUS_ADDRESS", g_test_dbus_get_bus_address(bus), 1);
-  setenv("ELM_PROFILE", "mobile", 1);
   setenv("LC_ALL", "C.UTF-8", 1);
-  setenv("APP_ASSIST_THEME", TEST_THEME, 1);
-  setenv("EINA_LOG_BACKTRACE", "-1", 0);
-  setenv("EINA_LOG_LEVELS", "eldbus:0,ecore_con:0,eina_safety:0", 0);
   setenv("TZ", "UTC", 1);
-
+  PageProcess process(TEST_THEME);
   testing::InitGoogleTest(&argc, argv);
   TestViewer viewer(argc, argv);
   viewer.start(argc, argv);
-  // Without the clean-up of GIO: it would wait for connections that live as long as the process.
-  fflush(stdout);
-  g_test_dbus_stop(bus);
-  _exit(viewer.result());
+  process.end(viewer.result());
 }

@@ -1,10 +1,8 @@
 #include "ViewTest.h"
 
-#include <gio/gio.h>
-#include <unistd.h>
-
-#include <cstdlib>
 #include <cstring>
+
+#include "PageProcess.h"
 
 bool TestApp::onCreate() {
   auto* window = new app_assist::WWindowController("views-test", ELM_WIN_BASIC);
@@ -18,41 +16,11 @@ bool TestApp::onCreate() {
 }
 
 void runViewTests(int argc, char** argv) {
-  // Buses of its own, whatever runs around.
-  const char* screen = getenv("DISPLAY");
-  const std::string display = screen ? screen : "";
-  GTestDBus* bus = g_test_dbus_new(G_TEST_DBUS_NONE);
-  g_test_dbus_up(bus);
-  // The test bus forgets the screen, too.
-  setenv("DISPLAY", display.c_str(), 1);
-  setenv("DBUS_SYSTEM_BUS_ADDRESS", g_test_dbus_get_bus_address(bus), 1);
-  setenv("ELM_PROFILE", "mobile", 1);
-  setenv("APP_ASSIST_THEME", TEST_THEME, 1);
-  setenv("EINA_LOG_BACKTRACE", "-1", 0);
-  setenv("EINA_LOG_LEVELS", "eldbus:0,ecore_con:0,eina_safety:0", 0);
-
+  PageProcess process(TEST_THEME);
   testing::InitGoogleMock(&argc, argv);
   TestApp app(argc, argv);
   app.start(argc, argv);
-  // Without the clean-up of GIO: it would wait for connections that live as long as the process.
-  fflush(stdout);
-  g_test_dbus_stop(bus);
-  _exit(app.result());
-}
-
-bool waitUntil(const std::function<bool()>& condition) {
-  constexpr double kPatience = 30.0;
-  const double deadline = ecore_time_get() + kPatience;
-  // The tick only wakes the loop up, so that the condition is looked at again.
-  Ecore_Timer* tick = ecore_timer_add(
-      0.01, [](void*) -> Eina_Bool { return ECORE_CALLBACK_RENEW; }, nullptr);
-  bool isTrue = condition();
-  while (!isTrue && ecore_time_get() < deadline) {
-    ecore_main_loop_iterate_may_block(1);
-    isTrue = condition();
-  }
-  ecore_timer_del(tick);
-  return isTrue;
+  process.end(app.result());
 }
 
 void ViewTest::push(app_assist::WContentViewController* view, void* viewParam, const char* style) {

@@ -2,10 +2,10 @@
 
 #include <app_assist.h>
 
-#include <functional>
 #include <string>
 
 #include "Items.h"
+#include "Loop.h"
 #include "PhoneTest.h"
 #include "ZQVText.h"
 
@@ -35,9 +35,6 @@ class BlankPage : public app_assist::WContentViewController {
 
 /// Runs all tests inside the application, on buses of its own, and ends the process.
 [[noreturn]] void runViewTests(int argc, char** argv);
-
-/// Runs the main loop until the condition holds; false when it does not within some seconds.
-bool waitUntil(const std::function<bool()>& condition);
 
 /// A test of pages. Pages end with it.
 class ViewTest : public PhoneTest {
