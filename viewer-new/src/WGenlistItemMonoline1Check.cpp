@@ -63,6 +63,7 @@ Evas_Object* WGenlistItemMonoline1Check::_createCheck(Evas_Object* parent) {
   evas_object_size_hint_align_set(check, EVAS_HINT_FILL, EVAS_HINT_FILL);
   evas_object_size_hint_weight_set(check, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
   evas_object_pass_events_set(check, EINA_TRUE);
+  elm_object_focus_allow_set(check, EINA_FALSE);
   evas_object_propagate_events_set(check, EINA_FALSE);
   evas_object_smart_callback_add(check, "changed", _checkChangedCb, this);
   evas_object_show(check);

@@ -27,7 +27,8 @@ int viewTypeOf(Evas_Object* grid) {
 Evas_Object* createCheck(const ZQViewerThumbnailItem* item, Evas_Object* grid) {
   Evas_Object* check = elm_check_add(grid);
   elm_check_state_set(check, item->checked);
-  // The check only shows the state: taps are for the cell.
+  // The check only shows the state: taps and keys are for the cell.
+  elm_object_focus_allow_set(check, EINA_FALSE);
   evas_object_repeat_events_set(check, EINA_TRUE);
   evas_object_propagate_events_set(check, EINA_FALSE);
   // Registered without a function, which the toolkit ignores: a change is nobody's business here.
