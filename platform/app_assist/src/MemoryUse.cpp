@@ -1,6 +1,7 @@
 #include "MemoryUse.h"
 
 #include <Elementary.h>
+#include <malloc.h>
 
 namespace app_assist {
 namespace {
@@ -11,10 +12,18 @@ constexpr int kPictureKilobytes = 1024;
 /// Of memory that has been freed and is returned when there is time. Left alone, a scrolled grid's
 /// old cells fill 16 megabytes, which then stay.
 constexpr int kFreedBytes = 256 * 1024;
+/// A picture's pixels are larger than that, and go back to the system at once.
+constexpr int kOwnMappingBytes = 128 * 1024;
 
 }  // namespace
 
-void limitMemoryUse() {
+void limitFreedMemory() {
+  // Threads that decode a picture now and then need no heap of their own, which would only grow.
+  mallopt(M_ARENA_MAX, 1);
+  mallopt(M_MMAP_THRESHOLD, kOwnMappingBytes);
+}
+
+void limitCaches() {
   elm_config_cache_image_cache_size_set(kPictureKilobytes);
   eina_freeq_mem_max_set(eina_freeq_main_get(), kFreedBytes);
 }

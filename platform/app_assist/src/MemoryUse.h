@@ -1,9 +1,12 @@
+/// How much of what it no longer uses an application keeps: little, for the phone's memory is for
+/// all of them.
 #pragma once
 
 namespace app_assist {
 
-/// The toolkit keeps little of what is no longer shown: the phone's memory is for all applications.
-/// After the toolkit's start, before the first window.
-void limitMemoryUse();
+/// For everything in the process; before the first thread.
+void limitFreedMemory();
+/// For the toolkit; after its start, before the first window.
+void limitCaches();
 
 }  // namespace app_assist

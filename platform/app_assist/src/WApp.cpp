@@ -88,6 +88,7 @@ void WApp::onAppControl(app_control_h) {}
 /// The name comes first: whoever launches the application waits for it, and requests queue up.
 int WApp::start(int argc, char** argv) {
   theApp = this;
+  limitFreedMemory();
   std::set_new_handler(outOfMemory);
   // They tell of clock, locale and power, which the platform does itself, and wait for the system
   // bus as long as it takes.
@@ -138,7 +139,7 @@ bool WApp::Private::setUpToolkit() {
     return false;
   }
   installGlibBridge();
-  limitMemoryUse();
+  limitCaches();
   followSettings(true);
   Language::bindCatalogues();
   Language::begin();
