@@ -125,9 +125,9 @@ def cold(subject, table, settings):
         _compare_launch(subject, table, settings, 10000, 1.3)
 
 
-def _scroll(subject, program):
+def _scroll(subject, program, seconds):
     before = at_rest(subject, program)
-    frames = subject.stopwatch("scroll", 30)
+    frames = subject.stopwatch("scroll", seconds)
     frames["left"] = at_rest(subject, program) - before
     subject.end(program)
     return frames
@@ -136,13 +136,14 @@ def _scroll(subject, program):
 def scroll(subject, table, settings):
     """the wheel through 1,000 files: frames, gaps, memory left behind"""
     token, names, _ = stock(subject, 1000, MAGENTA)
+    seconds = 10 if settings.quick else 15
     ours, theirs = [], []
     for _ in range(settings.runs):
         launch(subject, token)
         at_rest(subject, "zelqo-viewer")
-        ours.append(_scroll(subject, "zelqo-viewer"))
+        ours.append(_scroll(subject, "zelqo-viewer", seconds))
         start_bare(subject, 1000, names)
-        theirs.append(_scroll(subject, "bare_grid"))
+        theirs.append(_scroll(subject, "bare_grid", seconds))
 
     def of(frames, what):
         return [each[what] for each in frames]
