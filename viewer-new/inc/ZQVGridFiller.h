@@ -1,12 +1,13 @@
 #pragma once
 
-#include <Eina.h>
+#include <Elementary.h>
 
 #include <functional>
 
 #include "ZQVTimer.h"
 
 class ZQViewerThumbnailItem;
+class ZQVItemGrid;
 
 /// Puts a list of items into a grid: up to 19 at once, more in batches, so that the page shows
 /// before the whole list is in the grid.
@@ -18,6 +19,8 @@ class ZQVGridFiller {
   /// `items` is borrowed and must stay until the filling has ended or this object is gone. Null
   /// entries are skipped. `filled`, which may be null, is called after the last one.
   void start(Eina_List* items, Append append, Filled filled = nullptr);
+  /// Fills this grid, which takes no focus meanwhile; `selected` is called with `data` when a cell is.
+  void fill(ZQVItemGrid& grid, Eina_List* items, Evas_Smart_Cb selected, void* data);
   void stop() { _timer.stop(); }
   bool isRunning() const { return _timer.isRunning(); }
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "ZQVItemGrid.h"
 #include "ZQVThumbItem.h"
 
 namespace {
@@ -26,6 +27,16 @@ void ZQVGridFiller::start(Eina_List* items, Append append, Filled filled) {
     _appendRange(0, count - 1);
     if (_filled) _filled();
   }
+}
+
+void ZQVGridFiller::fill(ZQVItemGrid& grid, Eina_List* items, Evas_Smart_Cb selected, void* data) {
+  grid.keepFocusAway(true);
+  start(
+      items,
+      [&grid, selected, data](ZQViewerThumbnailItem* item) {
+        if (grid.get()) grid.append(item, selected, data);
+      },
+      [&grid] { grid.keepFocusAway(false); });
 }
 
 bool ZQVGridFiller::_appendBatch() {

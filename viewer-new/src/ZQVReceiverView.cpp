@@ -80,10 +80,7 @@ Evas_Object* ZQVReceiverView::onCreateView(Evas_Object* parent, void*) {
 }
 
 void ZQVReceiverView::onCreated() {
-  _grid.keepFocusAway(true);
-  _filler.start(
-      _items, [this](ZQViewerThumbnailItem* item) { _grid.append(item, _gridItemCb, this); },
-      [this] { _grid.keepFocusAway(false); });
+  _filler.fill(_grid, _items, _gridItemCb, this);
 }
 
 Elm_Object_Item* ZQVReceiverView::onPushToNaviframe(Evas_Object* naviframe) {

@@ -111,13 +111,7 @@ void ZQVSenderView::onCreated() {
     ZQV_ERROR("_thumbList is NULL");
     return;
   }
-  _grid.keepFocusAway(true);
-  _filler.start(
-      _items,
-      [this](ZQViewerThumbnailItem* item) {
-        if (_grid.get()) _grid.append(item, _gridItemCb, this);
-      },
-      [this] { _grid.keepFocusAway(false); });
+  _filler.fill(_grid, _items, _gridItemCb, this);
 }
 
 Elm_Object_Item* ZQVSenderView::onPushToNaviframe(Evas_Object* naviframe) {
