@@ -5,6 +5,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <set>
 
 #include "FullPage.h"
 
@@ -21,6 +22,8 @@ constexpr const char* kFriend = "+821011112222";
 constexpr const char* kOther = "+821033334444";
 constexpr const char* kMiddleScreen = "720x1280";
 constexpr const char* kHardestLanguages = "ar de ja ru";
+/// The largest that the settings offer.
+constexpr const char* kLargestText = "200";
 
 struct Shares {
   std::string single, expired;
@@ -130,6 +133,10 @@ void openExpired() {
   ASSERT_TRUE(comes("This share has expired"));
 }
 
+void setTextSize(const char* percent) {
+  thePhone()({"shell", VCONF, "set-int", "db/setting/accessibility/font_size", percent});
+}
+
 struct Page {
   const char* name;
   void (*open)();
@@ -196,6 +203,16 @@ const Page kPages[] = {
      kExpiry},
 };
 
+/// The rest is built like one of these.
+std::vector<Page> pagesOnOtherScreens() {
+  std::vector<Page> all;
+  const std::set<std::string> alike{"Selection", "Downloaded", "SentToTwo", "RecallPopup"};
+  for (const Page& page : kPages) {
+    if (alike.count(page.name) == 0) all.push_back(page);
+  }
+  return all;
+}
+
 using Place = std::tuple<const char*, Page>;
 
 std::string nameOf(const testing::TestParamInfo<Place>& place) {
@@ -221,7 +238,9 @@ class Looks : public testing::TestWithParam<Place> {
   /// What is wrong with the page as it is now, in any of the languages.
   std::string complaints(const std::string& turned) const {
     Words words = {"shell", CHECK};
-    if (screen() != kMiddleScreen) {
+    if (turned == "larger") {
+      words.insert(words.end(), {"--larger", "--languages", "de"});
+    } else if (screen() != kMiddleScreen) {
       words.insert(words.end(), {"--languages", kHardestLanguages});
     } else if (turned == "upright") {
       fs::create_directories(PICTURES);
@@ -242,13 +261,22 @@ TEST_P(Looks, AreRightInTheLanguages) {
   page().open();
   if (HasFatalFailure()) return;
   EXPECT_EQ(complaints("upright"), "");
+  if (screen() == kMiddleScreen) {
+    setTextSize(kLargestText);
+    EXPECT_EQ(complaints("larger"), "");
+    setTextSize("100");
+  }
   thePhone()({"rotate", "90"});
   EXPECT_EQ(complaints("lying"), "");
 }
 
-INSTANTIATE_TEST_SUITE_P(Screens, Looks,
-                         testing::Combine(testing::Values("480x800", kMiddleScreen, "1080x1920"),
+INSTANTIATE_TEST_SUITE_P(MiddleScreen, Looks,
+                         testing::Combine(testing::Values(kMiddleScreen),
                                           testing::ValuesIn(kPages)),
+                         nameOf);
+INSTANTIATE_TEST_SUITE_P(OtherScreens, Looks,
+                         testing::Combine(testing::Values("480x800", "1080x1920"),
+                                          testing::ValuesIn(pagesOnOtherScreens())),
                          nameOf);
 
 TEST(Letters, OfAllLanguagesAreOfOneFamily) {

@@ -18,7 +18,7 @@ constexpr const char* kInterface = R"xml(<node><interface name="phone.Looks1">
 <method name="Look">
 <arg type="s" name="language" direction="out"/>
 <arg type="(iii)" name="width, height, rotation" direction="out"/>
-<arg type="a(sbbb(iiii)(iiii)d)" name="texts" direction="out"/>
+<arg type="a(sbbbb(iiii)(iiii)d)" name="texts" direction="out"/>
 </method></interface></node>)xml";
 
 struct Area {
@@ -90,6 +90,10 @@ int firstLineHeight(Evas_Object* text) {
   return height;
 }
 
+bool mayEndInDots(Evas_Object* text) {
+  return styleOf(text).find("ellipsis=") != std::string::npos;
+}
+
 bool isCutOff(Evas_Object* text, const Area& area) {
   constexpr int kRounding = 2;
   int width = 0, height = 0, natural = 0;
@@ -125,9 +129,10 @@ void addText(GVariantBuilder* texts, Evas_Object* text, const Place& place) {
   const Area lines = linesOf(text, area);
   const Area seen = seenOf(text, lines);
   if (seen.width == 0 || seen.height == 0) return;
-  g_variant_builder_add(texts, "(sbbb(iiii)(iiii)d)", plain.get(), isCutOff(text, area),
-                        place.scrolls, place.isInPopup, lines.x, lines.y, lines.width, lines.height,
-                        seen.x, seen.y, seen.width, seen.height, evas_object_scale_get(text));
+  g_variant_builder_add(texts, "(sbbbb(iiii)(iiii)d)", plain.get(), isCutOff(text, area),
+                        mayEndInDots(text), place.scrolls, place.isInPopup, lines.x, lines.y,
+                        lines.width, lines.height, seen.x, seen.y, seen.width, seen.height,
+                        evas_object_scale_get(text));
 }
 
 void add(GVariantBuilder* texts, Evas_Object* object, Place place) {
@@ -156,7 +161,7 @@ void addWindow(GVariantBuilder* texts, Evas* canvas) {
 
 GVariant* look() {
   GVariantBuilder texts;
-  g_variant_builder_init(&texts, G_VARIANT_TYPE("a(sbbb(iiii)(iiii)d)"));
+  g_variant_builder_init(&texts, G_VARIANT_TYPE("a(sbbbb(iiii)(iiii)d)"));
   int width = 0, height = 0, rotation = 0;
   Eina_List* windows = ecore_evas_ecore_evas_list_get();
   while (windows) {
@@ -168,7 +173,7 @@ GVariant* look() {
     addWindow(&texts, ecore_evas_get(window));
   }
   const char* language = setlocale(LC_MESSAGES, nullptr);
-  return g_variant_new("(s(iii)a(sbbb(iiii)(iiii)d))", language ? language : "", width, height,
+  return g_variant_new("(s(iii)a(sbbbb(iiii)(iiii)d))", language ? language : "", width, height,
                        rotation, &texts);
 }
 

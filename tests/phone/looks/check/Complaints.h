@@ -3,8 +3,8 @@
 
 #include "Look.h"
 
-/// One line each.
-std::vector<std::string> complaintsAbout(const Look& look);
+/// One line each. Lines that have no room for larger text may end in dots.
+std::vector<std::string> complaintsAbout(const Look& look, bool isTextLarger);
 
 /// Does the page show the message? What the message leaves open may be anything.
 bool shows(const Look& look, const std::string& message);

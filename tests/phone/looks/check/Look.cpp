@@ -14,7 +14,7 @@ constexpr auto kBetweenLooks = std::chrono::milliseconds(40);
 common::OwnedVariant ask(GDBusConnection* bus) {
   return common::OwnedVariant(
       g_dbus_connection_call_sync(bus, "phone.Looks", "/phone/Looks", "phone.Looks1", "Look",
-                                  nullptr, G_VARIANT_TYPE("(s(iii)a(sbbb(iiii)(iiii)d))"),
+                                  nullptr, G_VARIANT_TYPE("(s(iii)a(sbbbb(iiii)(iiii)d))"),
                                   G_DBUS_CALL_FLAGS_NO_AUTO_START, -1, nullptr, nullptr));
 }
 
@@ -27,13 +27,14 @@ bool isIn(GVariant* answer, const std::string& language) {
 Text readText(GVariant* answer) {
   Text text;
   const char* words = nullptr;
-  gboolean isCutOff = FALSE, scrolls = FALSE, isInPopup = FALSE;
+  gboolean isCutOff = FALSE, mayEndInDots = FALSE, scrolls = FALSE, isInPopup = FALSE;
   Area &lines = text.lines, &seen = text.seen;
-  g_variant_get(answer, "(&sbbb(iiii)(iiii)d)", &words, &isCutOff, &scrolls, &isInPopup, &lines.x,
-                &lines.y, &lines.width, &lines.height, &seen.x, &seen.y, &seen.width, &seen.height,
-                &text.scale);
+  g_variant_get(answer, "(&sbbbb(iiii)(iiii)d)", &words, &isCutOff, &mayEndInDots, &scrolls,
+                &isInPopup, &lines.x, &lines.y, &lines.width, &lines.height, &seen.x, &seen.y,
+                &seen.width, &seen.height, &text.scale);
   text.words = words;
   text.isCutOff = isCutOff;
+  text.mayEndInDots = mayEndInDots;
   text.scrolls = scrolls;
   text.isInPopup = isInPopup;
   return text;

@@ -19,7 +19,8 @@ Area overlap(const Area& a, const Area& b);
 struct Text {
   std::string words;
   bool isCutOff = false;  ///< it wants more room than it has
-  bool scrolls = false;   ///< it lies in something that moves below a finger
+  bool mayEndInDots = false;
+  bool scrolls = false;  ///< it lies in something that moves below a finger
   bool isInPopup = false;
   Area lines;        ///< what is drawn of it
   Area seen;         ///< what is left of that by what lies around it

@@ -1,8 +1,8 @@
-// looks-check [--languages "LANGUAGE..."] [--pictures PREFIX] [--begins ID] ID...: goes through the
-// languages of the phone, all or these, with the page that the viewer shows now, and prints what is
-// wrong with its texts, one line each. Each ID is a message that the page has to show; one of them
-// may have to begin at the margin. With a prefix every language leaves a picture of the screen,
-// PREFIX-LANGUAGE.png.
+// looks-check [--larger] [--languages "LANGUAGE..."] [--pictures PREFIX] [--begins ID] ID...: goes
+// through the languages of the phone, all or these, with the page that the viewer shows now, and
+// prints what is wrong with its texts, one line each. Each ID is a message that the page has to
+// show; one of them may have to begin at the margin. With a prefix every language leaves a picture
+// of the screen, PREFIX-LANGUAGE.png.
 
 #include <base/Bus.h>
 #include <libintl.h>
@@ -40,6 +40,7 @@ std::vector<std::string> languages(const std::string& wanted) {
 }
 
 struct Wishes {
+  bool isTextLarger = false;
   std::string languages;
   std::string pictures;
   std::string begins;
@@ -50,7 +51,9 @@ Wishes read(int count, char** words) {
   Wishes wishes;
   for (int i = 1; i < count; i++) {
     const std::string word = words[i];
-    if (word == "--languages" && i + 1 < count) {
+    if (word == "--larger") {
+      wishes.isTextLarger = true;
+    } else if (word == "--languages" && i + 1 < count) {
       wishes.languages = words[++i];
     } else if (word == "--pictures" && i + 1 < count) {
       wishes.pictures = words[++i];
@@ -76,7 +79,9 @@ void takePicture(const std::string& prefix, const std::string& language) {
 }
 
 void check(const Look& look, const Wishes& wishes) {
-  for (const std::string& complaint : complaintsAbout(look)) puts(complaint.c_str());
+  for (const std::string& complaint : complaintsAbout(look, wishes.isTextLarger)) {
+    puts(complaint.c_str());
+  }
   const char* language = look.language.c_str();
   for (const std::string& id : wishes.messages) {
     if (!shows(look, message(id))) printf("%s: %s is not shown\n", language, id.c_str());
