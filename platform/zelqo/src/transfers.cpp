@@ -1,6 +1,7 @@
 #include "transfers.h"
 
 #include <base/Fault.h>
+#include <common/Owned.h>
 #include <dlfcn.h>
 #include <glib.h>
 
@@ -8,10 +9,20 @@ namespace {
 
 constexpr const char* kLibrary = "libzelqo-transfer.so.1";
 
+/// It lies beside this one. A bare name would be looked for where the sanitizers' library says when
+/// that stands between.
+void* openLibrary() {
+  Dl_info self{};
+  if (!dladdr(&kLibrary, &self)) return nullptr;
+  const common::OwnedText folder(g_path_get_dirname(self.dli_fname));
+  const common::OwnedText path(g_build_filename(folder.get(), kLibrary, nullptr));
+  return dlopen(path.get(), RTLD_NOW | RTLD_LOCAL);
+}
+
 /// Null, with a log line, when the library is not there.
 template <typename Call>
 Call* find(const char* name) {
-  static void* const library = dlopen(kLibrary, RTLD_NOW | RTLD_LOCAL);
+  static void* const library = openLibrary();
   void* const call = library ? dlsym(library, name) : nullptr;
   if (!call) g_warning("zelqo: nothing can be transferred: %s", dlerror());
   return reinterpret_cast<Call*>(call);
