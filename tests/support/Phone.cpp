@@ -143,7 +143,7 @@ std::string Phone::sanitizerFindings() const {
 }
 
 bool waitFor(const std::function<bool()>& condition, std::chrono::milliseconds patience) {
-  const auto end = std::chrono::steady_clock::now() + patience;
+  const auto end = std::chrono::steady_clock::now() + kSlowness * patience;
   while (!condition()) {
     if (std::chrono::steady_clock::now() > end) return false;
     std::this_thread::sleep_for(std::chrono::milliseconds(30));

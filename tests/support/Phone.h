@@ -64,9 +64,15 @@ class Phone {
   bool _isUp = false;
 };
 
+#ifdef __SANITIZE_ADDRESS__
+constexpr int kSlowness = 4;  ///< of programs under the sanitizers
+#else
+constexpr int kSlowness = 1;
+#endif
 constexpr std::chrono::seconds kPatience{20};
 
-/// Looks again and again until the condition holds. False when it never does.
+/// Looks again and again until the condition holds. False when it does not in that time, or in
+/// `kSlowness` times as much.
 bool waitFor(const std::function<bool()>& condition,
              std::chrono::milliseconds patience = kPatience);
 

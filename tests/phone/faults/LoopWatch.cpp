@@ -31,11 +31,11 @@ void LoopWatch::begin() {
 }
 
 std::string LoopWatch::settle(std::chrono::milliseconds patience) {
-  return ask("settle " + std::to_string(patience.count()));
+  return ask("settle " + std::to_string((phone::kSlowness * patience).count()));
 }
 
 std::string LoopWatch::rest(std::chrono::milliseconds patience) {
-  return ask("rest " + std::to_string(patience.count()));
+  return ask("rest " + std::to_string((phone::kSlowness * patience).count()));
 }
 
 void LoopWatch::run(const std::string& command) {
