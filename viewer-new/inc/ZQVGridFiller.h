@@ -19,7 +19,8 @@ class ZQVGridFiller {
   /// `items` is borrowed and must stay until the filling has ended or this object is gone. Null
   /// entries are skipped. `filled`, which may be null, is called after the last one.
   void start(Eina_List* items, Append append, Filled filled = nullptr);
-  /// Fills this grid, which takes no focus meanwhile; `selected` is called with `data` when a cell is.
+  /// Fills this grid, which takes no focus meanwhile; `selected` is called with `data` when a cell
+  /// is.
   void fill(ZQVItemGrid& grid, Eina_List* items, Evas_Smart_Cb selected, void* data);
   void stop() { _timer.stop(); }
   bool isRunning() const { return _timer.isRunning(); }

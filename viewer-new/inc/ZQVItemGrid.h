@@ -26,6 +26,8 @@ class ZQVItemGrid {
   /// While cells come in batches the focus has to stay away: it would move on to the newest cell,
   /// and the grid would scroll after it.
   void keepFocusAway(bool isAway);
+  /// Tells screen readers what the cells are, in the language of now.
+  void nameCells();
   void forgetCells();
 
   Evas_Object* get() const { return _grid; }

@@ -47,6 +47,7 @@ class ZQVSelectView : public app_assist::WContentViewController {
   WGenlistItemMonoline1Check* _selectAllRow() const;
   void _nameSelectAllRow();
   void _nameCell(const ZQViewerThumbnailItem& item);
+  void _nameCells();
   void _clearChecks();
   void _showSelectedCount();
   void _setTitleText(const char* text);

@@ -25,6 +25,8 @@ inline Evas_Object* zqvAddBackButton(Evas_Object* naviframe, Evas_Smart_Cb click
   Evas_Object* back = elm_button_add(naviframe);
   elm_object_style_set(back, "naviframe/end_btn/default");
   evas_object_smart_callback_add(back, "clicked", clicked, data);
-  zqvSetAccessibleName(back, zqvText("Back"));
+  // Translated whenever a screen reader asks, as the language may change.
+  efl_access_object_translation_domain_set(back, ZQV_TEXT_DOMAIN);
+  zqvSetAccessibleName(back, "Back");
   return back;
 }

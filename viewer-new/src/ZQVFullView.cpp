@@ -161,6 +161,8 @@ void ZQVFullView::update(int event) {
   elm_object_domain_translatable_text_set(button, ZQV_TEXT_DOMAIN, isOpen ? kOpen : kDownload);
   if (_unablePopup) _unablePopup->update(event);
   if (_wifiPopup) _wifiPopup->update(event);
+  _grid.nameCells();
+  if (_curItem) zqvNamePage(*this, zqvCellName(*_curItem));
   _fitPages();  // they may run the other way now
 }
 

@@ -53,6 +53,15 @@ void ZQVItemGrid::keepFocusAway(bool isAway) {
   if (_grid) elm_object_focus_allow_set(_grid, !isAway);
 }
 
+void ZQVItemGrid::nameCells() {
+  const Eina_List* node = nullptr;
+  void* data = nullptr;
+  EINA_LIST_FOREACH(_items, node, data) {
+    const auto* item = static_cast<ZQViewerThumbnailItem*>(data);
+    if (item) zqvSetAccessibleName(item->gridItems[_viewType], zqvCellName(*item));
+  }
+}
+
 void ZQVItemGrid::forgetCells() {
   const Eina_List* node = nullptr;
   void* data = nullptr;

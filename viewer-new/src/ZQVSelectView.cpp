@@ -110,6 +110,7 @@ void ZQVSelectView::update(int event) {
     elm_genlist_item_update(row);
   }
   _nameSelectAllRow();
+  _nameCells();
 
   const char* const parts[] = {kDonePart, kCancelPart};
   const char* const texts[] = {kDone, kCancel};
@@ -303,6 +304,14 @@ void ZQVSelectView::_nameCell(const ZQViewerThumbnailItem& item) {
   std::string name = zqvCellName(item);
   if (item.checked) name.append(", ").append(zqvText("selected"));
   zqvSetAccessibleName(item.gridItems[ZQV_VIEW_SELECT], name);
+}
+
+void ZQVSelectView::_nameCells() {
+  const Eina_List* node = nullptr;
+  void* item = nullptr;
+  EINA_LIST_FOREACH(_items, node, item) {
+    if (item) _nameCell(*static_cast<ZQViewerThumbnailItem*>(item));
+  }
 }
 
 void ZQVSelectView::_clearChecks() {

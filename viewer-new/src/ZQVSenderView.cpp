@@ -158,6 +158,7 @@ void ZQVSenderView::update(int event) {
   elm_object_item_domain_translatable_part_text_set(getNaviItem(), nullptr, ZQV_TEXT_DOMAIN,
                                                     kTitle);
   zqvNamePage(*this, zqvText(kTitle));
+  _grid.nameCells();
   if (!_updateRows()) return;
   _updateToolbar();
   if (_processingPopup) {

@@ -42,6 +42,7 @@ void DownloadPage::SetUp() {
 void DownloadPage::TearDown() {
   thePhone()({"service", "ok"});
   thePhone()({"network", "wifi"});
+  thePhone()({"language", "en_US.UTF-8"});
   thePhone().closeViewer();
   killDownloadApplication();
   for (const auto& entry : fs::directory_iterator(ofPhone(kFolder))) fs::remove_all(entry);

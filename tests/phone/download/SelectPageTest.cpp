@@ -108,6 +108,15 @@ TEST_F(SelectPage, DownloadsAllOfTwoHundredFilesAndLogsNoError) {
   for (const std::string& record : newRecords()) EXPECT_NE(record.substr(0, 4), "ZQ52");
 }
 
+TEST_F(SelectPage, NamesItsCellsInTheLanguageOfNow) {
+  ASSERT_TRUE(selectFrom(thePhone().share(papers(2))));
+  ASSERT_TRUE(tap("Paper 1.txt"));
+  ASSERT_TRUE(titleIs("1 selected"));
+  thePhone()({"language", "de_DE.UTF-8"});
+  EXPECT_TRUE(comes("Paper 1.txt, 100,0B, Text, nicht heruntergeladen, ausgewählt"));
+  EXPECT_TRUE(comes("Paper 2.txt, 200,0B, Text, nicht heruntergeladen"));
+}
+
 TEST_F(SelectPage, ShowsNoFilesThatAreOnTheirWay) {
   const Share share = thePhone().share(papers(2));
   ASSERT_TRUE(selectFrom(share));

@@ -129,6 +129,14 @@ TEST_F(Pager, RunsFromRightToLeftInArabic) {
   EXPECT_TRUE(pageIs(file(6)));
 }
 
+TEST_F(Pager, NamesItsPagesAndButtonsInTheLanguageOfNow) {
+  openReceived(numberedFiles(2), file(1));
+  thePhone()({"language", "de_DE.UTF-8"});
+  EXPECT_TRUE(comes("Zurück"));
+  EXPECT_TRUE(comes(file(1) + ", 10,0B, Text, nicht heruntergeladen"));
+  EXPECT_TRUE(comes(file(2) + ", 10,0B, Text, nicht heruntergeladen"));
+}
+
 TEST_F(Pager, FindsThePageAmongFiveThousand) {
   constexpr int kFiles = 5000;
   thePhone().launchReceived(thePhone().share({}, {"--raw-manifest", manifestOf(kFiles)}).token);
