@@ -21,19 +21,21 @@ constexpr mode_t kOthers = S_IRWXG | S_IRWXO;
 class Secrets : public testing::Test {
  protected:
   /// Leaves behind whatever the applications write on their ways.
-  void SetUp() override {
+  static void SetUpTestSuite() {
     thePhone().closeViewer();
+    _journey = std::make_unique<Journey>();
     LoopWatch watch;
-    ASSERT_TRUE(_journey.go(watch));
-    ASSERT_FALSE(_journey.received().token.empty() || _journey.sent().token.empty());
+    ASSERT_TRUE(_journey->go(watch));
+    ASSERT_FALSE(_journey->received().token.empty() || _journey->sent().token.empty());
   }
-  void TearDown() override {
+  static void TearDownTestSuite() {
+    _journey.reset();
     thePhone().closeViewer();
     thePhone().end({"contacts-picker", "download-manager"});
   }
 
-  std::vector<std::string> all() const {
-    std::vector<std::string> secrets{_journey.received().token, _journey.sent().token};
+  static std::vector<std::string> all() {
+    std::vector<std::string> secrets{_journey->received().token, _journey->sent().token};
     const auto store =
         common::Database::open(thePhone().folder() + "/opt-usr/dbspace/zelqo.db", "");
     if (!store) return {};
@@ -48,8 +50,10 @@ class Secrets : public testing::Test {
     return text.str();
   }
 
-  const Journey _journey;
+  static std::unique_ptr<Journey> _journey;
 };
+
+std::unique_ptr<Journey> Secrets::_journey;
 
 }  // namespace
 
