@@ -5,6 +5,7 @@
 
 #include <string>
 
+#include "ZQVAddressIndex.h"
 #include "ZQVDownloadSignals.h"
 #include "ZQVItemGrid.h"
 #include "ZQVNeighbourPictures.h"
@@ -86,5 +87,6 @@ class ZQVFullView : public app_assist::WContentViewController {
   const char** _titleFrames = nullptr;
   ZQVTimer _delayer;
   ZQVSmartCallback _rotation;
+  ZQVAddressIndex _addresses;
   ZQVDownloadSignals _signals;
 };

@@ -362,17 +362,13 @@ bool ZQVFullView::_isInServiceFolder(const ZQViewerThumbnailItem& item) const {
 }
 
 void ZQVFullView::_downloadSignalCb(const char* member, const char* url) {
-  Evas_Object* pager = _grid.get();
-  Elm_Object_Item* cell = pager ? elm_gengrid_first_item_get(pager) : nullptr;
-  for (; cell; cell = elm_gengrid_item_next_get(cell)) {
-    auto* item = static_cast<ZQViewerThumbnailItem*>(elm_object_item_data_get(cell));
-    if (!item || !isSameAddress(item->downloadUrl, url)) continue;
-    // The page below follows the signals, too: the status may be the new one already.
-    item->downloadStatus = ZQVDownloadSignals::statusOf(member);
-    zqvSetAccessibleName(cell, zqvCellName(*item));
-    if (item == _curItem) _updateDownloadedStatus();
-    return;
-  }
+  ZQViewerThumbnailItem* item = _grid.get() ? _addresses.find(_items, url) : nullptr;
+  Elm_Object_Item* cell = item ? item->gridItems[_grid.getViewType()] : nullptr;
+  if (!cell) return;
+  // The page below follows the signals, too: the status may be the new one already.
+  item->downloadStatus = ZQVDownloadSignals::statusOf(member);
+  zqvSetAccessibleName(cell, zqvCellName(*item));
+  if (item == _curItem) _updateDownloadedStatus();
 }
 
 /// A hand-over takes every checked file; this page never leaves more than one check behind.
