@@ -49,6 +49,9 @@ class ZQVFullView : public app_assist::WContentViewController {
   bool _isSentShare() const { return _grid.getViewType() == ZQV_VIEW_FULL_SENDER; }
   void _setUpPager();
   static void _resizedCb(void* data, Evas* canvas, Evas_Object* pager, void* info);
+  void _takeKeys(Evas_Object* window);
+  void _leaveKeys();
+  static void _keyCb(void* data, Evas* canvas, Evas_Object* window, void* info);
   void _fitPages();
   Elm_Object_Item* _currentCell() const;
   void _showCurrentPage();
@@ -82,6 +85,7 @@ class ZQVFullView : public app_assist::WContentViewController {
   bool _isWifiOnly = false;
   ZQVUnableOpenFilePopup* _unablePopup = nullptr;
   ZQVWifiSelectPopup* _wifiPopup = nullptr;
+  ZQVWeakObject _window;
   ZQVWeakObject _toolButton;
   ZQVWeakObject _titleLayout;
   const char** _titleFrames = nullptr;

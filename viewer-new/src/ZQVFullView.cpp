@@ -31,6 +31,7 @@ constexpr const char* kBoundData = "bindedObjectClickedCbData";
 constexpr double kSettleTime = 0.1;
 /// Upstream's way to say "as many as you like".
 constexpr int kNoPageLimit = 9999;
+constexpr const char* kArrows[] = {"Left", "Right"};
 
 void setButton(Evas_Object* button, const char* text, bool isEnabled) {
   elm_object_domain_translatable_text_set(button, ZQV_TEXT_DOMAIN, text);
@@ -62,6 +63,7 @@ ZQVFullView::ZQVFullView(Eina_List* items, int32_t viewKind, const char* sender,
 
 ZQVFullView::~ZQVFullView() {
   _signals.stop();
+  _leaveKeys();
   _clearMark();
   if (_unablePopup) _unablePopup->forgetOwner();
   if (_wifiPopup) _wifiPopup->forgetOwner();
@@ -127,6 +129,7 @@ void ZQVFullView::onPushed(Elm_Object_Item* item) {
   evas_object_data_set(_grid.get(), kBoundData, this);
   evas_object_data_set(_grid.get(), kBoundButton, _toolButton.get());
   _rotation.connect(zqvWindowOf(*this), "rotation,changed", _rotateCb, this);
+  _takeKeys(zqvWindowOf(*this));
   if (_isSentShare()) {
     elm_object_domain_translatable_text_set(_toolButton, ZQV_TEXT_DOMAIN, kOpen);
   } else {
@@ -279,6 +282,34 @@ void ZQVFullView::_setUpPager() {
 
 void ZQVFullView::_resizedCb(void* data, Evas*, Evas_Object*, void*) {
   static_cast<ZQVFullView*>(data)->_fitPages();
+}
+
+/// The pager takes the arrows to move among pages to select, of which it has none; the window has
+/// them, too.
+void ZQVFullView::_takeKeys(Evas_Object* window) {
+  _window = window;
+  for (const char* key : kArrows) {
+    if (window && !evas_object_key_grab(window, key, 0, 0, EINA_FALSE)) ZQV_ERROR("no key %s", key);
+  }
+  if (window) evas_object_event_callback_add(window, EVAS_CALLBACK_KEY_DOWN, _keyCb, this);
+}
+
+void ZQVFullView::_leaveKeys() {
+  if (!_window) return;
+  evas_object_event_callback_del_full(_window, EVAS_CALLBACK_KEY_DOWN, _keyCb, this);
+  for (const char* key : kArrows) evas_object_key_ungrab(_window, key, 0, 0);
+}
+
+void ZQVFullView::_keyCb(void* data, Evas*, Evas_Object* window, void* info) {
+  auto* view = static_cast<ZQVFullView*>(data);
+  const char* key = static_cast<Evas_Event_Key_Down*>(info)->key;
+  const bool isLeft = g_strcmp0(key, kArrows[0]) == 0;
+  if (!isLeft && g_strcmp0(key, kArrows[1]) != 0) return;
+  Evas_Object* pager = view->_grid.get();
+  if (elm_object_focused_object_get(window) != pager) return;
+  const bool isBack = isLeft != (elm_object_mirrored_get(pager) != EINA_FALSE);
+  const int page = view->_currentPage + (isBack ? -1 : 1);
+  if (view->_itemOfPage(page)) zqvShowPage(pager, page);
 }
 
 /// Makes every page as large as the pager, keeps the page on screen, and lets paging snap again

@@ -73,6 +73,28 @@ testing::AssertionResult reach(const std::string& name, const std::string& key =
   return testing::AssertionFailure() << name << " is not on the way " << way;
 }
 
+/// Goes to the full view's pages.
+bool isPagerReached() {
+  return waitFor([] {
+    const Tree tree = thePhone().tree();
+    for (const Widget& widget : tree.widgets()) {
+      if (widget.role == "tree table" && widget.is("focused")) return true;
+    }
+    press("Tab");
+    return false;
+  });
+}
+
+/// The full view names its page after the file on screen.
+testing::AssertionResult isPage(const std::string& name) {
+  const bool came = waitFor([&] {
+    const auto pages = thePhone().tree().withRole("page tab");
+    return !pages.empty() && pages.back().name.rfind(name + ", ", 0) == 0;
+  });
+  if (came) return testing::AssertionSuccess();
+  return testing::AssertionFailure() << name << " is not the page of\n" << thePhone().tree();
+}
+
 bool isAccent(int x, int y) {
   return waitFor([&] { return phone::colourAt(thePhone(), x, y).isAbout(kAccent); },
                  std::chrono::seconds(5));
@@ -157,6 +179,24 @@ TEST_F(Keyboard, SelectsAndDownloads) {
   EXPECT_TRUE(goes("Download via Wi-Fi only"));
   press("Escape");
   EXPECT_TRUE(comes("Files from"));
+}
+
+TEST_F(Keyboard, TurnsThePagesOfTheFullView) {
+  openReceived();
+  ASSERT_TRUE(tap("b.pdf"));
+  ASSERT_TRUE(goes("Files from"));
+  EXPECT_TRUE(reach("Back"));
+  ASSERT_TRUE(isPagerReached());
+  press("Right");
+  EXPECT_TRUE(isPage("c.zip"));
+  press("Right");  // there is none further
+  press("Left");
+  EXPECT_TRUE(isPage("b.pdf"));
+  press("Left");
+  EXPECT_TRUE(isPage("a.txt"));
+  EXPECT_TRUE(reach("Download"));
+  press("Left");  // a button turns no page
+  EXPECT_TRUE(isPage("a.txt"));
 }
 
 TEST_F(Keyboard, ReachesEverythingOnTheSentPage) {
