@@ -83,11 +83,10 @@ void addFile(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* 
 }
 
 /// The page that the pager opens with comes with its picture; turning a page waits for none.
-ZQVScreenPicture::First firstOn(Evas_Object* pager) {
-  Eina_List* pages = elm_gengrid_realized_items_get(pager);
-  const bool isOpening = pages == nullptr;
-  eina_list_free(pages);
-  return isOpening ? ZQVScreenPicture::First::AtOnce : ZQVScreenPicture::First::WhenDecoded;
+ZQVScreenPicture::First firstOf(const ZQViewerThumbnailItem* item, Evas_Object* pager) {
+  return evas_object_data_get(pager, ZQVFullCell::kOpening) == item
+             ? ZQVScreenPicture::First::AtOnce
+             : ZQVScreenPicture::First::WhenDecoded;
 }
 
 Evas_Object* addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
@@ -102,7 +101,7 @@ Evas_Object* addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Ev
     elm_image_animated_set(picture, EINA_TRUE);
     elm_image_animated_play_set(picture, EINA_TRUE);
   } else if (path && !isDefault) {
-    ZQVScreenPicture::follow(picture, path.get(), grid, firstOn(grid));
+    ZQVScreenPicture::follow(picture, path.get(), grid, firstOf(item, grid));
   }
   if (isDimmed(item, grid)) common.dimObject(picture);
   return picture;

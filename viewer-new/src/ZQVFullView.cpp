@@ -10,6 +10,7 @@
 #include "ZQVDownloadRule.h"
 #include "ZQVDownloadedFile.h"
 #include "ZQVFrames.h"
+#include "ZQVFullCell.h"
 #include "ZQVLog.h"
 #include "ZQVOrlantLog.h"
 #include "ZQVOwned.h"
@@ -71,6 +72,7 @@ ZQVFullView::~ZQVFullView() {
   evas_object_smart_callback_del_full(_grid.get(), "realized", _realizedCb, this);
   evas_object_smart_callback_del_full(_grid.get(), "scroll", _scrollCb, this);
   evas_object_event_callback_del_full(_grid.get(), EVAS_CALLBACK_RESIZE, _resizedCb, this);
+  evas_object_data_del(_grid.get(), ZQVFullCell::kOpening);
   evas_object_data_del(_grid.get(), kBoundData);
   evas_object_data_del(_grid.get(), kBoundButton);
 }
@@ -106,6 +108,7 @@ void ZQVFullView::onCreated() {
     // Files may have been dropped from the share; here page and file always agree.
     item->index = position++;
   }
+  evas_object_data_set(_grid.get(), ZQVFullCell::kOpening, _passedItem);
   _curItem = _passedItem;
   _currentPage = _passedItem->index;
   _showCurrentPage();
