@@ -2,8 +2,17 @@
 
 #include <Ecore.h>
 
+namespace {
+
+#ifdef __SANITIZE_ADDRESS__
+constexpr double kPatience = 120.0;  // everything takes longer there
+#else
+constexpr double kPatience = 30.0;
+#endif
+
+}  // namespace
+
 bool waitUntil(const std::function<bool()>& condition) {
-  constexpr double kPatience = 30.0;
   const double deadline = ecore_time_get() + kPatience;
   // The tick only wakes the loop up, so that the condition is looked at again.
   Ecore_Timer* tick = ecore_timer_add(

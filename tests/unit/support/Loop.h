@@ -2,5 +2,5 @@
 
 #include <functional>
 
-/// Runs the main loop until the condition holds; false when it does not in half a minute.
+/// Runs the main loop until the condition holds; false when it does not for too long.
 bool waitUntil(const std::function<bool()>& condition);

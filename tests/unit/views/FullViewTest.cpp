@@ -206,6 +206,7 @@ TEST_F(FullView, PaintsNoOtherPageFirst) {
   naviframe.push(view, &items[6], "fullview");
   pager = view->getEvasObj();
   ASSERT_TRUE(waitForPage(6));
+  ASSERT_TRUE(waitUntil([&] { return !painted.pages().empty(); }));
   painted.stop();
   EXPECT_THAT(painted.pages(), ElementsAre(6));
 }
