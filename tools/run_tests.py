@@ -89,7 +89,8 @@ class Runner:
         suppressions = os.path.join(ROOT, "tests", "leaks.supp")
         os.environ.setdefault("LSAN_OPTIONS", f"suppressions={suppressions}:print_suppressions=0")
         # Whole stacks, or the suppressions do not see which library it was.
-        os.environ.setdefault("ASAN_OPTIONS", "fast_unwind_on_malloc=0")
+        # The leak checker can crash over the thread-local memory of libraries loaded late.
+        os.environ.setdefault("ASAN_OPTIONS", "fast_unwind_on_malloc=0:intercept_tls_get_addr=0")
         os.environ.setdefault("UBSAN_OPTIONS", "print_stacktrace=1:halt_on_error=1")
 
     def command(self, program, extra):
