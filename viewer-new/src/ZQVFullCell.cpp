@@ -35,7 +35,7 @@ bool isDimmed(const ZQViewerThumbnailItem* item, Evas_Object* grid) {
 
 /// The picture to show; a file that may not be shown counts as not there, and null stays null.
 ZQVOwnedText pictureOf(const ZQViewerThumbnailItem* item) {
-  const char* path = item->largePath ? item->largePath : item->thumbPath;
+  const char* path = ZQVFullCell::pathOf(*item);
   if (!path) return nullptr;
   if (ZQVPictureGate::passes(path, ZQVPictureGate::FullView)) return ZQVOwnedText(g_strdup(path));
   return ZQVOwnedText(item->mimeType ? ZQVIcons::_getOthersIconPath(item->mimeType, false)
@@ -122,6 +122,10 @@ void addPlayButton(Evas_Object* grid, Evas_Object* layout) {
 }
 
 }  // namespace
+
+const char* ZQVFullCell::pathOf(const ZQViewerThumbnailItem& item) {
+  return item.largePath ? item.largePath : item.thumbPath;
+}
 
 Evas_Object* ZQVFullCell::__getFullViewContent(const ZQViewerThumbnailItem* item, Evas_Object* grid,
                                                const char* part) {

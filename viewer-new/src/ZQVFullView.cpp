@@ -290,11 +290,12 @@ void ZQVFullView::_resizedCb(void* data, Evas*, Evas_Object*, void*) {
 /// The pager takes the arrows to move among pages to select, of which it has none; the window has
 /// them, too.
 void ZQVFullView::_takeKeys(Evas_Object* window) {
+  if (!window) return;
   _window = window;
   for (const char* key : kArrows) {
-    if (window && !evas_object_key_grab(window, key, 0, 0, EINA_FALSE)) ZQV_ERROR("no key %s", key);
+    if (!evas_object_key_grab(window, key, 0, 0, EINA_FALSE)) ZQV_ERROR("no key %s", key);
   }
-  if (window) evas_object_event_callback_add(window, EVAS_CALLBACK_KEY_DOWN, _keyCb, this);
+  evas_object_event_callback_add(window, EVAS_CALLBACK_KEY_DOWN, _keyCb, this);
 }
 
 void ZQVFullView::_leaveKeys() {

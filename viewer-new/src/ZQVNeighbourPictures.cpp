@@ -1,5 +1,6 @@
 #include "ZQVNeighbourPictures.h"
 
+#include "ZQVFullCell.h"
 #include "ZQVPictureGate.h"
 #include "ZQVScreenPicture.h"
 #include "ZQVThumbItem.h"
@@ -9,7 +10,7 @@ namespace {
 void decode(ZQVPicturePreload* preload, Elm_Object_Item* cell) {
   const auto* item =
       cell ? static_cast<ZQViewerThumbnailItem*>(elm_object_item_data_get(cell)) : nullptr;
-  const char* path = !item ? nullptr : item->largePath ? item->largePath : item->thumbPath;
+  const char* path = item ? ZQVFullCell::pathOf(*item) : nullptr;
   Evas_Object* pager = path ? elm_object_item_widget_get(cell) : nullptr;
   const int size = path ? ZQVScreenPicture::sizeOn(pager, path) : 0;
   if (size > 0 && ZQVPictureGate::isLight(path)) {
