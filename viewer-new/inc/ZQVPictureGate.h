@@ -17,4 +17,6 @@ class ZQVPictureGate {
   static bool isReducible(const char* path);
   /// May it be decoded before anybody asks to see it in full view? Nothing is logged.
   static bool isLight(const char* path);
+  /// Does decoding it for a small cell take longer than a frame may?
+  static bool isSlow(const char* path);
 };

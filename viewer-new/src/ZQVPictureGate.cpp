@@ -14,6 +14,7 @@ namespace {
 constexpr uint32_t kLongestSide = 8192;
 constexpr uint64_t kMostPixels = 40000000;
 constexpr uint64_t kMostLightPixels = 4000000;
+constexpr uint64_t kMostQuickPixels = 500000;
 constexpr uint64_t kMostReducedPixels = 200000000;
 constexpr off_t kLargestThumbnail = 8 << 20;
 /// A JPEG file may carry this many blocks (embedded profiles, notes) before its size.
@@ -23,6 +24,8 @@ struct PictureSize {
   uint32_t width = 0;
   uint32_t height = 0;
   bool reducible = false;  ///< the loader can decode it at a fraction of its size
+
+  uint64_t pixels() const { return static_cast<uint64_t>(width) * height; }
 };
 
 /// A file that is closed with the end of its scope.
@@ -148,7 +151,7 @@ const char* refusalOf(const OpenFile& file, ZQVPictureGate::Use use) {
   PictureSize size;
   if (!readSize(file, &size)) return "not a known kind of picture";
   if (size.width == 0 || size.height == 0) return "no size";
-  const uint64_t pixels = static_cast<uint64_t>(size.width) * size.height;
+  const uint64_t pixels = size.pixels();
   if (!thumbnail && size.reducible) {
     return pixels > kMostReducedPixels ? "too many pixels" : nullptr;
   }
@@ -177,5 +180,11 @@ bool ZQVPictureGate::isLight(const char* path) {
   const OpenFile file(path);
   PictureSize size;
   if (!file.isOpen() || refusalOf(file, FullView) || !readSize(file, &size)) return false;
-  return size.reducible || static_cast<uint64_t>(size.width) * size.height <= kMostLightPixels;
+  return size.reducible || size.pixels() <= kMostLightPixels;
+}
+
+bool ZQVPictureGate::isSlow(const char* path) {
+  const OpenFile file(path);
+  PictureSize size;
+  return file.isOpen() && readSize(file, &size) && size.pixels() > kMostQuickPixels;
 }

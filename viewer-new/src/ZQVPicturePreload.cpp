@@ -2,11 +2,14 @@
 
 #include <utility>
 
+#include "ZQVFilePages.h"
+
 void ZQVPicturePreload::start(Evas* canvas, const char* path, int size,
                               std::function<void()> done) {
   stop();
   _done = std::move(done);
   _image = evas_object_image_filled_add(canvas);
+  ZQVFilePages::dropWhenDecoded(_image);
   evas_object_event_callback_add(_image, EVAS_CALLBACK_IMAGE_PRELOADED, _preloadedCb, this);
   // As the image widget has it: only then is it the same picture to the toolkit.
   evas_object_image_load_orientation_set(_image, EINA_TRUE);

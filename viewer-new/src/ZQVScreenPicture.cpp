@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "ZQVFilePages.h"
 #include "ZQVPictureGate.h"
 
 // Deleted with the picture.
@@ -58,6 +59,7 @@ void ZQVScreenPicture::_fit() {
 
 void ZQVScreenPicture::_showWhenDecoded() {
   _isWaiting = true;
+  ZQVFilePages::dropWhenDecoded(elm_image_object_get(_picture));
   evas_object_event_callback_add(elm_image_object_get(_picture), EVAS_CALLBACK_IMAGE_PRELOADED,
                                  _decodedCb, this);
   elm_image_preload_disabled_set(_picture, EINA_FALSE);

@@ -6,6 +6,7 @@
 
 #include "ZQVCellParts.h"
 #include "ZQVCommon.h"
+#include "ZQVFilePages.h"
 #include "ZQVFrames.h"
 #include "ZQVIcons.h"
 #include "ZQVLog.h"
@@ -54,6 +55,18 @@ void addName(const ZQViewerThumbnailItem* item, Evas_Object* layout, bool dimmed
   elm_object_part_content_set(layout, "filename", label);
 }
 
+/// A prescale that is set last ends the preloading: a thumbnail is there with its cell's first
+/// frame. A photo that has no thumbnail comes when it is decoded, and nothing waits for it.
+void setUpDecoding(Evas_Object* icon, const char* path) {
+  const bool slow = ZQVPictureGate::isSlow(path);
+  if (slow) {
+    elm_image_prescale_set(icon, kPrescale);
+    ZQVFilePages::dropWhenDecoded(elm_image_object_get(icon));
+  }
+  elm_image_preload_disabled_set(icon, EINA_FALSE);
+  if (!slow) elm_image_prescale_set(icon, kPrescale);
+}
+
 void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
   const bool sender = viewTypeOf(grid) == ZQV_VIEW_SENDER;
   const std::string path = pictureOf(item);
@@ -62,8 +75,7 @@ void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Objec
 
   Evas_Object* icon = ZQViewerCommon::getInstance().createIcon(grid, path.c_str());
   elm_image_fill_outside_set(icon, EINA_TRUE);
-  elm_image_preload_disabled_set(icon, EINA_FALSE);
-  elm_image_prescale_set(icon, kPrescale);
+  setUpDecoding(icon, path.c_str());
   if (dimmed) ZQViewerCommon::getInstance().dimObject(icon);
 
   if (item->thumbUrl || !item->fileName) {

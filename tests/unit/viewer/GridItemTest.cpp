@@ -1,5 +1,7 @@
 #include <efl_assist.h>
 
+#include <cctype>
+
 #include "PageTest.h"
 #include "ZQVCommon.h"
 #include "ZQVFullCell.h"
@@ -7,6 +9,28 @@
 #include "ZQVSmallCell.h"
 
 namespace {
+
+constexpr int kPhotoSide = 1000;
+
+/// Of the file's pages, those that are in this process's memory; -1 when the file is not mapped.
+int residentKilobytes(const std::string& path) {
+  std::ifstream maps("/proc/self/smaps");
+  int sum = -1;
+  bool inFile = false;
+  for (std::string line; std::getline(maps, line);) {
+    int kilobytes = 0;
+    // What is said of a mapping begins with a capital letter, unlike its address.
+    if (!isupper(line[0])) inFile = line.find(path) != std::string::npos;
+    if (inFile && sscanf(line.c_str(), "Rss: %d", &kilobytes) == 1) {
+      sum = std::max(sum, 0) + kilobytes;
+    }
+  }
+  return sum;
+}
+
+void setTrue(void* flag, Evas*, Evas_Object*, void*) {
+  *static_cast<bool*>(flag) = true;
+}
 
 class GridItem : public PageTest {
  protected:
@@ -104,6 +128,22 @@ TEST_F(GridItem, ShowsAThumbnailThatHasArrived) {
   EXPECT_EQ(part("filename"), nullptr);
   EXPECT_EQ(part("playicon"), nullptr);
   EXPECT_EQ(part("downstatus"), nullptr);
+}
+
+TEST_F(GridItem, WaitsForNoPhotoThatHasNoThumbnail) {
+  const std::string large = picture("large.jpg", kPhotoSide);
+  build(file("large.jpg", "image/jpeg", large.c_str(), "url"), ZQV_VIEW_SENDER);
+  bool decoded = false;
+  evas_object_event_callback_add(elm_image_object_get(part("thumbnail")),
+                                 EVAS_CALLBACK_IMAGE_PRELOADED, setTrue, &decoded);
+  EXPECT_TRUE(waitUntil([&decoded] { return decoded; }));
+}
+
+TEST_F(GridItem, KeepsNoFileInMemoryWhosePictureIsDecoded) {
+  const std::string large = picture("kept.jpg", kPhotoSide);
+  build(file("kept.jpg", "image/jpeg", large.c_str(), "url"), ZQV_VIEW_SENDER);
+  ASSERT_GT(residentKilobytes(large), 0);
+  EXPECT_TRUE(waitUntil([&large] { return residentKilobytes(large) == 0; }));
 }
 
 TEST_F(GridItem, ShowsTheImageIconUntilTheThumbnailArrives) {

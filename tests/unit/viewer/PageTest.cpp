@@ -4,6 +4,9 @@
 #include <contacts.h>
 #include <libintl.h>
 
+#include <algorithm>
+#include <random>
+
 using app_assist::WContentViewController;
 using app_assist::WNaviframeController;
 
@@ -63,7 +66,7 @@ std::string PageTest::textOf(Evas_Object* object, const char* part) {
   return text ? text : "";
 }
 
-std::string PageTest::picture(const char* name) {
+std::string PageTest::picture(const char* name, int side) {
   static const std::string folder = [] {
     char path[] = "/tmp/pages.XXXXXX";
     return std::string(mkdtemp(path));
@@ -71,7 +74,11 @@ std::string PageTest::picture(const char* name) {
   const std::string path = folder + "/" + name;
   Ecore_Evas* canvas = ecore_evas_buffer_new(8, 8);
   Evas_Object* image = evas_object_image_filled_add(ecore_evas_get(canvas));
-  evas_object_image_size_set(image, 8, 8);
+  evas_object_image_size_set(image, side, side);
+  auto* pixels = static_cast<uint32_t*>(evas_object_image_data_get(image, EINA_TRUE));
+  std::minstd_rand noise;
+  std::generate_n(pixels, side * side, [&noise] { return 0xff000000u | noise(); });
+  evas_object_image_data_set(image, pixels);
   evas_object_image_save(image, path.c_str(), nullptr, nullptr);
   ecore_evas_free(canvas);
   return path;

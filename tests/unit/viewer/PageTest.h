@@ -49,8 +49,8 @@ class PageTest : public ViewerTest {
   static void click(Evas_Object* button) {
     evas_object_smart_callback_call(button, "clicked", nullptr);
   }
-  /// Names of the files of a folder with pictures, so that they may be shown.
-  static std::string picture(const char* name);
+  /// The path of a picture with that name; it is square, and no compression makes it small.
+  static std::string picture(const char* name, int side = 8);
 
   Evas_Object* const window = TestViewer::get().window();
   app_assist::WNaviframeController& naviframe = *TestViewer::get().naviframe();

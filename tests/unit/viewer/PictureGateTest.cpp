@@ -163,6 +163,17 @@ TEST_F(PictureGate, KnowsWhichPicturesMayBeDecodedAhead) {
   EXPECT_FALSE(ZQVPictureGate::isLight("/nowhere.jpg"));
 }
 
+TEST_F(PictureGate, KnowsWhichPicturesTakeLong) {
+  const auto isSlow = [this](const std::string& content) {
+    return ZQVPictureGate::isSlow(file(content).c_str());
+  };
+  EXPECT_TRUE(isSlow(jpeg(4000, 3000)));
+  EXPECT_TRUE(isSlow(png(1000, 501)));
+  EXPECT_FALSE(isSlow(png(1000, 500)));
+  EXPECT_FALSE(isSlow("words"));
+  EXPECT_FALSE(ZQVPictureGate::isSlow("/nowhere.jpg"));
+}
+
 TEST_F(PictureGate, IsSilentAboutWhatIsNotThere) {
   EXPECT_FALSE(ZQVPictureGate::passes(nullptr, ZQVPictureGate::Thumbnail));
   EXPECT_FALSE(ZQVPictureGate::passes("", ZQVPictureGate::Thumbnail));
