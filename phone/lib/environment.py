@@ -26,6 +26,8 @@ def phone(state, home, run, language):
         "DBUS_SYSTEM_BUS_ADDRESS": f"unix:path={run}/system.bus",
         "GIO_USE_VFS": "local", "GIO_USE_VOLUME_MONITOR": "unix", "GSETTINGS_BACKEND": "keyfile",
         "ELM_PROFILE": "mobile", "ELM_ATSPI_MODE": "1",
+        # a finger scrolls after a twentieth of an inch; a light flick turns a page
+        "ELM_THUMBSCROLL_THRESHOLD": "16", "ELM_THUMBSCROLL_SENSITIVITY_FRICTION": "1.0",
         "EINA_LOG_BACKTRACE": "-1", "EINA_LOG_LEVELS": ",".join(_QUIET),
         "XDG_CURRENT_DESKTOP": "phone",
         "FONTCONFIG_FILE": os.path.join(ROOT, "phone", "etc", "fonts.conf"),

@@ -52,6 +52,12 @@ TEST_F(Pager, MovesOnePageWithASwipe) {
   EXPECT_TRUE(pageIs(file(2)));
 }
 
+TEST_F(Pager, MovesOnePageWithALightFlick) {
+  openReceived(numberedFiles(4), file(2));
+  thePhone()({"swipe", "430,640", "290,640", "80"});
+  EXPECT_TRUE(pageIs(file(3)));
+}
+
 TEST_F(Pager, MovesNoFurtherThanOnePageWithAFastSwipe) {
   openReceived(numberedFiles(6), file(1));
   thePhone()({"swipe", "700,640", "20,640", "40"});
