@@ -42,20 +42,23 @@ def painted(state, args):
     """Waits until that many items with names are to be seen and nothing moves any more."""
     words = parse(args, words=(0, 1), usage="phone painted [ITEMS]").words
     wanted = number(words[0], "the number of items", 0, 10000) if words else 1
-    from lib import widgets
     end, before, still = time.monotonic() + _PAINTING, None, 0
     while time.monotonic() < end:
-        seen = widgets.read(link.output(state, [state.tool("phone-tree")]),
-                            state.settings()["screen"])
-        items = [widget for widget in seen if widgets.can_be_tapped(widget) and widget.name
-                 and "item" in widget.role]
         now = link.output(state, ["sh", "-c", '"$0" | cksum', state.tool("phone-screen")])
-        still = still + 1 if now == before and len(items) >= wanted else 0
-        if still >= _STILL:
+        still = still + 1 if now == before else 0
+        # the tree of a page with many cells takes longer to read than a picture of the screen
+        if still >= _STILL and _named_items(state) >= wanted:
             return
         before = now
         time.sleep(0.2)
     raise Failure(f"there are not {wanted} items on the screen, or it does not come to rest")
+
+
+def _named_items(state):
+    from lib import widgets
+    seen = widgets.read(link.output(state, [state.tool("phone-tree")]), state.settings()["screen"])
+    return sum(1 for widget in seen
+               if widgets.can_be_tapped(widget) and widget.name and "item" in widget.role)
 
 
 def tap(state, args):
