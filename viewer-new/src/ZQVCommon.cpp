@@ -226,9 +226,10 @@ char* ZQViewerCommon::makeThemeMarkup(const char* text, const char* textClass, c
 
 Evas_Object* ZQViewerCommon::createIcon(Evas_Object* parent, const char* path) {
   Evas_Object* icon = elm_icon_add(parent);
+  // Before the file: after it, a thread would have begun to decode, and the picture would wait.
+  elm_image_preload_disabled_set(icon, EINA_TRUE);
   elm_image_file_set(icon, path, nullptr);
   elm_image_aspect_fixed_set(icon, EINA_TRUE);
-  elm_image_preload_disabled_set(icon, EINA_TRUE);
   evas_object_show(icon);
   return icon;
 }

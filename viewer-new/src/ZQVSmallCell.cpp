@@ -55,16 +55,22 @@ void addName(const ZQViewerThumbnailItem* item, Evas_Object* layout, bool dimmed
   elm_object_part_content_set(layout, "filename", label);
 }
 
-/// A prescale that is set last ends the preloading: a thumbnail is there with its cell's first
-/// frame. A photo that has no thumbnail comes when it is decoded, and nothing waits for it.
-void setUpDecoding(Evas_Object* icon, const char* path) {
-  const bool slow = ZQVPictureGate::isSlow(path);
-  if (slow) {
+bool isScrolled(Evas_Object* grid) {
+  int y = 0;
+  elm_scroller_region_get(grid, nullptr, &y, nullptr, nullptr);
+  return y > 0;
+}
+
+/// A prescale that is set last ends the preloading: a page is there with all its thumbnails. When
+/// it is scrolled nothing waits for a picture, nor ever for a photo that has no thumbnail.
+void setUpDecoding(Evas_Object* icon, Evas_Object* grid, const char* path) {
+  const bool later = isScrolled(grid) || ZQVPictureGate::isSlow(path);
+  if (later) {
     elm_image_prescale_set(icon, kPrescale);
     ZQVFilePages::dropWhenDecoded(elm_image_object_get(icon));
   }
   elm_image_preload_disabled_set(icon, EINA_FALSE);
-  if (!slow) elm_image_prescale_set(icon, kPrescale);
+  if (!later) elm_image_prescale_set(icon, kPrescale);
 }
 
 void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
@@ -75,7 +81,7 @@ void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Objec
 
   Evas_Object* icon = ZQViewerCommon::getInstance().createIcon(grid, path.c_str());
   elm_image_fill_outside_set(icon, EINA_TRUE);
-  setUpDecoding(icon, path.c_str());
+  setUpDecoding(icon, grid, path.c_str());
   if (dimmed) ZQViewerCommon::getInstance().dimObject(icon);
 
   if (item->thumbUrl || !item->fileName) {
