@@ -1,4 +1,5 @@
 #include <common/DamagedDatabase.h>
+#include <common/Database.h>
 #include <common/Owned.h>
 #include <fcntl.h>
 #include <sqlite3.h>
@@ -31,7 +32,7 @@ class FolderLock {
 // A fresh connection: what an open one says depends on what it has read before.
 int checked(const std::string& path) {
   sqlite3* handle = nullptr;
-  int result = sqlite3_open_v2(path.c_str(), &handle, SQLITE_OPEN_READWRITE, nullptr);
+  int result = openSharedFile(path, SQLITE_OPEN_READWRITE, &handle);
   const Owned<sqlite3, sqlite3_close> owner(handle);
   if (result != SQLITE_OK) return result;
   sqlite3_stmt* prepared = nullptr;

@@ -3,6 +3,7 @@
 #include <unistd.h>
 
 #include <atomic>
+#include <mutex>
 
 namespace common {
 namespace {
@@ -48,10 +49,20 @@ bool switchToWal(sqlite3* handle) {
   return false;
 }
 
+/// SQLite would set aside 130 KB for each connection, for small files of some hundred rows.
+void limitMemory() {
+  sqlite3_config(SQLITE_CONFIG_PAGECACHE, nullptr, 0, 0);
+  sqlite3_config(SQLITE_CONFIG_LOOKASIDE, 0, 0);
+}
+
 }  // namespace
 
-void waitBriefly(sqlite3* handle) {
-  sqlite3_busy_handler(handle, busyCb, nullptr);
+int openSharedFile(const std::string& path, int flags, sqlite3** handle) {
+  static std::once_flag first;
+  std::call_once(first, limitMemory);
+  const int result = sqlite3_open_v2(path.c_str(), handle, flags, nullptr);
+  if (*handle) sqlite3_busy_handler(*handle, busyCb, nullptr);
+  return result;
 }
 
 void makePrivateFile(const std::string& path) {
@@ -128,7 +139,7 @@ std::unique_ptr<Database> Database::open(const std::string& path, const char* sc
   makePrivateFile(path);
   sqlite3* handle = nullptr;
   const int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE;
-  const bool opened = sqlite3_open_v2(path.c_str(), &handle, flags, nullptr) == SQLITE_OK;
+  const bool opened = openSharedFile(path, flags, &handle) == SQLITE_OK;
   std::unique_ptr<Database> database(new Database(handle));
   if (opened && database->configure(schema)) return database;
   logFailure(handle, ("cannot open " + path).c_str());
@@ -136,7 +147,6 @@ std::unique_ptr<Database> Database::open(const std::string& path, const char* sc
 }
 
 bool Database::configure(const char* schema) {
-  waitBriefly(_handle.get());
   return switchToWal(_handle.get()) && execute("PRAGMA synchronous=NORMAL") &&
          execute("PRAGMA foreign_keys=ON") && execute(schema);
 }

@@ -17,9 +17,9 @@ namespace common {
 /// gives it to the files beside it.
 void makePrivateFile(const std::string& path);
 
-/// For a file that another process is writing: waits half a second, and for a while not at all when
-/// that was in vain.
-void waitBriefly(sqlite3* handle);
+/// As sqlite3_open_v2(). Where another process is writing the file, the connection waits half a
+/// second, and for a while not at all when that was in vain. It takes little memory.
+int openSharedFile(const std::string& path, int flags, sqlite3** handle);
 
 /// One execution of a prepared statement, reset when the use of it ends: bind in order, then step
 /// or run.

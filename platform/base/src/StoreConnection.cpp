@@ -39,10 +39,9 @@ int StoreConnection::open(const std::string& path, bool create) {
   if (create) common::makePrivateFile(path);
   sqlite3* db = nullptr;
   const int flags = SQLITE_OPEN_READWRITE | (create ? SQLITE_OPEN_CREATE : 0);
-  int code = sqlite3_open_v2(path.c_str(), &db, flags, nullptr);
+  int code = common::openSharedFile(path, flags, &db);
   _db.reset(db);
   if (code != SQLITE_OK) return code;
-  common::waitBriefly(db);
   if ((code = switchToWal()) != SQLITE_OK) return code;
   if ((code = execute("PRAGMA synchronous=NORMAL")) != SQLITE_OK) return code;
   code = execute("CREATE TABLE IF NOT EXISTS pref(k TEXT PRIMARY KEY, v) WITHOUT ROWID");
