@@ -2,6 +2,7 @@
 
 #include <glib.h>
 
+#include <algorithm>
 #include <climits>
 
 namespace dlog {
@@ -9,6 +10,14 @@ namespace {
 
 constexpr std::string_view kCut = "\033[0;m...";
 constexpr size_t kTagLimit = 64;
+constexpr char kFirstPrintable = ' ', kLastPrintable = '~';
+
+/// How many characters there are that need no closer look: all of most texts.
+size_t plainLength(std::string_view text) {
+  const auto* end = std::find_if(text.begin(), text.end(),
+                                 [](char c) { return c < kFirstPrintable || c > kLastPrintable; });
+  return static_cast<size_t>(end - text.begin());
+}
 
 /// The length of the colour sequence that `text` starts with, or 0.
 size_t colourLength(std::string_view text) {
@@ -55,6 +64,11 @@ std::string nextPiece(std::string_view& text) {
 std::string oneLine(std::string_view text, size_t limit) {
   std::string line;
   while (!text.empty()) {
+    const size_t room = limit - std::min(limit, line.size() + kCut.size());
+    const size_t plain = std::min(plainLength(text), room);
+    line += text.substr(0, plain);
+    text.remove_prefix(plain);
+    if (plain > 0) continue;
     const std::string piece = nextPiece(text);
     if (line.size() + piece.size() + kCut.size() > limit) return line.append(kCut);
     line += piece;
