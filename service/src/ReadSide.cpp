@@ -12,7 +12,7 @@
 namespace service {
 namespace {
 
-constexpr char kPicture[] = "image/png";
+constexpr char kPicture[] = "image/jpeg";
 constexpr char kManifest[] = "application/json";
 constexpr char kAnyFile[] = "application/octet-stream";
 

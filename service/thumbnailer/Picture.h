@@ -24,7 +24,8 @@ Picture loadPicture(const std::string& path);
 /// One frame of the video, upright; null when there is none.
 Picture loadVideoFrame(const std::string& path);
 
-/// Writes a PNG whose longer side is at most `longest`, never an enlarged one; whole or not at all.
+/// Writes a JPEG whose longer side is at most `longest`, never an enlarged one; whole or not at
+/// all.
 bool savePicture(GdkPixbuf* picture, int longest, const std::string& path);
 
 }  // namespace thumbnailer

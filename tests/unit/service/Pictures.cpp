@@ -30,13 +30,31 @@ std::string chunk(const std::string& kind, const std::string& data) {
   return bigEndian(static_cast<unsigned>(data.size())) + kind + data + bigEndian(crc(kind + data));
 }
 
-bool isRed(GdkPixbuf* picture, double x, double y) {
+const guint8* pixelAt(GdkPixbuf* picture, double x, double y) {
   const int channels = gdk_pixbuf_get_n_channels(picture);
   const int column = static_cast<int>(x * gdk_pixbuf_get_width(picture));
   const int row = static_cast<int>(y * gdk_pixbuf_get_height(picture));
-  const guint8* pixel =
-      gdk_pixbuf_read_pixels(picture) + row * gdk_pixbuf_get_rowstride(picture) + column * channels;
+  return gdk_pixbuf_read_pixels(picture) + row * gdk_pixbuf_get_rowstride(picture) +
+         column * channels;
+}
+
+bool isRed(GdkPixbuf* picture, double x, double y) {
+  const guint8* pixel = pixelAt(picture, x, y);
   return pixel[0] > 150 && pixel[2] < 100;
+}
+
+bool isWhite(GdkPixbuf* picture, double x, double y) {
+  const guint8* pixel = pixelAt(picture, x, y);
+  return pixel[0] > 250 && pixel[1] > 250 && pixel[2] > 250;
+}
+
+std::string encoded(GdkPixbuf* picture, const char* format) {
+  gchar* bytes = nullptr;
+  gsize size = 0;
+  gdk_pixbuf_save_to_buffer(picture, &bytes, &size, format, nullptr, nullptr);
+  const std::string text(bytes, size);
+  g_free(bytes);
+  return text;
 }
 
 }  // namespace
@@ -47,12 +65,13 @@ std::string encodedPicture(int width, int height, const char* format) {
   const Picture quarter(
       gdk_pixbuf_new_subpixbuf(picture.get(), 0, 0, (width + 1) / 2, (height + 1) / 2));
   gdk_pixbuf_fill(quarter.get(), 0xff0000ff);
-  gchar* bytes = nullptr;
-  gsize size = 0;
-  gdk_pixbuf_save_to_buffer(picture.get(), &bytes, &size, format, nullptr, nullptr);
-  const std::string encoded(bytes, size);
-  g_free(bytes);
-  return encoded;
+  return encoded(picture.get(), format);
+}
+
+std::string clearPicture(int width, int height) {
+  const Picture picture(gdk_pixbuf_new(GDK_COLORSPACE_RGB, TRUE, 8, width, height));
+  gdk_pixbuf_fill(picture.get(), 0);
+  return encoded(picture.get(), "png");
 }
 
 std::string turnedJpeg(int width, int height) {
@@ -85,5 +104,6 @@ Decoded decode(const std::string& bytes) {
   decoded.height = gdk_pixbuf_get_height(picture.get());
   decoded.isRedUpperLeft = isRed(picture.get(), 0.2, 0.2);
   decoded.isRedUpperRight = isRed(picture.get(), 0.8, 0.2);
+  decoded.isWhiteUpperLeft = isWhite(picture.get(), 0.2, 0.2);
   return decoded;
 }

@@ -22,8 +22,8 @@ TEST_F(MadePictures, ComeInThreeSizes) {
   EXPECT_EQ(fetch(shared, "mid").width, 1280);
   EXPECT_EQ(fetch(shared, "big").width, 1600);
   const HttpAnswer thumb = httpGet(address(shared, "thumb/0"));
-  EXPECT_EQ(thumb.body.substr(1, 3), "PNG");
-  EXPECT_EQ(thumb.headers.at("Content-Type"), "image/png");
+  EXPECT_EQ(thumb.body.substr(0, 3), "\xff\xd8\xff");
+  EXPECT_EQ(thumb.headers.at("Content-Type"), "image/jpeg");
 }
 
 TEST_F(MadePictures, AreNeverEnlarged) {
@@ -32,6 +32,12 @@ TEST_F(MadePictures, AreNeverEnlarged) {
     EXPECT_EQ(fetch(shared, kind).width, 100) << kind;
     EXPECT_EQ(fetch(shared, kind).height, 50) << kind;
   }
+}
+
+TEST_F(MadePictures, AreWhiteWhereTheFileIsClear) {
+  const TestShare shared = share({{"a.png", "image/png", clearPicture(400, 300)}});
+  EXPECT_TRUE(fetch(shared, "thumb").isWhiteUpperLeft);
+  EXPECT_TRUE(fetch(shared, "mid").isWhiteUpperLeft);
 }
 
 TEST_F(MadePictures, StandUpright) {
