@@ -25,7 +25,7 @@ PATIENCE = 300        # seconds for one program
 LAST_LINES = 40
 SANITIZER_FACTOR = 4  # how much slower programs may be under the sanitizers
 AT_A_TIME = 2         # phones outside the one of the unit tests
-FUZZ_SECONDS = 20     # for each fuzzer, unless the environment says otherwise; 0 for none
+FUZZ_SECONDS = 60     # for each fuzzer, unless the environment says otherwise; 0 for none
 
 
 def arguments():

@@ -14,6 +14,16 @@ constexpr int kPictureKilobytes = 1024;
 constexpr int kFreedBytes = 256 * 1024;
 /// A picture's pixels are larger than that, and go back to the system at once.
 constexpr int kOwnMappingBytes = 128 * 1024;
+/// By then the page that was asked for stands, and the one before it is gone.
+constexpr double kAfterRequest = 0.5;
+
+Ecore_Timer* returning = nullptr;
+
+Eina_Bool returnCb(void*) {
+  malloc_trim(0);
+  returning = nullptr;
+  return ECORE_CALLBACK_CANCEL;
+}
 
 }  // namespace
 
@@ -26,6 +36,14 @@ void limitFreedMemory() {
 void limitCaches() {
   elm_config_cache_image_cache_size_set(kPictureKilobytes);
   eina_freeq_mem_max_set(eina_freeq_main_get(), kFreedBytes);
+}
+
+void returnFreedMemorySoon() {
+  if (returning) {
+    ecore_timer_reset(returning);
+  } else {
+    returning = ecore_timer_add(kAfterRequest, returnCb, nullptr);
+  }
 }
 
 }  // namespace app_assist

@@ -8,5 +8,7 @@ namespace app_assist {
 void limitFreedMemory();
 /// For the toolkit; after its start, before the first window.
 void limitCaches();
+/// After a request: the page before it leaves pieces all over the heap, more with every request.
+void returnFreedMemorySoon();
 
 }  // namespace app_assist

@@ -150,7 +150,12 @@ bool WApp::Private::setUpToolkit() {
 int WApp::Private::run() {
   visibility = ecore_event_handler_add(ECORE_X_EVENT_WINDOW_VISIBILITY_CHANGE, visibilityCb, this);
   if (self->onCreate()) {
-    if (service) service->deliverTo([this](app_control_h request) { self->onAppControl(request); });
+    if (service) {
+      service->deliverTo([this](app_control_h request) {
+        self->onAppControl(request);
+        returnFreedMemorySoon();
+      });
+    }
     elm_run();
   }
   tearDown();
