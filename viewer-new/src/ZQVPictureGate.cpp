@@ -14,7 +14,7 @@ namespace {
 constexpr uint32_t kLongestSide = 8192;
 constexpr uint64_t kMostPixels = 40000000;
 constexpr uint64_t kMostLightPixels = 4000000;
-constexpr uint64_t kMostQuickPixels = 500000;
+constexpr uint64_t kMostQuickPixels = 150000;
 constexpr uint64_t kMostReducedPixels = 200000000;
 constexpr off_t kLargestThumbnail = 8 << 20;
 /// A JPEG file may carry this many blocks (embedded profiles, notes) before its size.

@@ -8,8 +8,7 @@ namespace media {
 namespace {
 
 constexpr const char* kAttributes = G_FILE_ATTRIBUTE_STANDARD_TYPE
-    "," G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE "," G_FILE_ATTRIBUTE_TIME_MODIFIED
-    "," G_FILE_ATTRIBUTE_THUMBNAIL_PATH;
+    "," G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE "," G_FILE_ATTRIBUTE_TIME_MODIFIED;
 
 using OwnedFile = common::Owned<GFile, g_object_unref>;
 using OwnedInfo = common::Owned<GFileInfo, g_object_unref>;
@@ -24,13 +23,19 @@ guint64 modified(GFileInfo* info) {
   return g_file_info_get_attribute_uint64(info, G_FILE_ATTRIBUTE_TIME_MODIFIED);
 }
 
-// GIO's own verdict is of no use here: the thumbnailer writes times with decimals, which GIO takes
-// for a mismatch.
-std::string currentThumbnail(GFileInfo* info) {
-  const char* path = g_file_info_get_attribute_byte_string(info, G_FILE_ATTRIBUTE_THUMBNAIL_PATH);
-  if (!path) return {};
-  const auto thumbnail = query(path, G_FILE_ATTRIBUTE_TIME_MODIFIED);
-  return thumbnail && modified(thumbnail.get()) >= modified(info) ? path : "";
+/// Where the desktop's thumbnailer keeps it. GIO would find the smaller ones only.
+std::string thumbnailPath(const std::string& path) {
+  const common::OwnedText uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
+  if (!uri) return {};
+  const common::OwnedText hash(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.get(), -1));
+  return std::string(g_get_user_cache_dir()) + "/thumbnails/" + kThumbnailSize + "/" + hash.get() +
+         ".png";
+}
+
+std::string currentThumbnail(const std::string& path, GFileInfo* info) {
+  const std::string thumbnail = thumbnailPath(path);
+  const auto made = query(thumbnail, G_FILE_ATTRIBUTE_TIME_MODIFIED);
+  return made && modified(made.get()) >= modified(info) ? thumbnail : "";
 }
 
 std::string mimeTypeOf(GFileInfo* info) {
@@ -52,7 +57,7 @@ std::optional<MediaRecord> lookUp(const std::string& path) {
                    G_FILE_TYPE_REGULAR) {
     return {};
   }
-  MediaRecord record{path, mimeTypeOf(info.get()), currentThumbnail(info.get())};
+  MediaRecord record{path, mimeTypeOf(info.get()), currentThumbnail(path, info.get())};
   if (record.thumbnail.empty() && hasPicture(record.mimeType)) {
     queueThumbnail(record.path, record.mimeType);
   }

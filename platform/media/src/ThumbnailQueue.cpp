@@ -45,8 +45,8 @@ class ThumbnailQueue {
       g_variant_builder_add(&types, "s", request.mimeType.c_str());
     }
     _pending.clear();
-    const common::OwnedVariant arguments(
-        g_variant_ref_sink(g_variant_new("(asasssu)", &uris, &types, "large", "foreground", 0u)));
+    const common::OwnedVariant arguments(g_variant_ref_sink(
+        g_variant_new("(asasssu)", &uris, &types, kThumbnailSize, "foreground", 0u)));
     const common::OwnedBus bus = base::sessionBus();
     if (!bus) return;
     g_dbus_connection_call(bus.get(), kService, kPath, kService, "Queue", arguments.get(), nullptr,

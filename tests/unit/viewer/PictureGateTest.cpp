@@ -168,8 +168,8 @@ TEST_F(PictureGate, KnowsWhichPicturesTakeLong) {
     return ZQVPictureGate::isSlow(file(content).c_str());
   };
   EXPECT_TRUE(isSlow(jpeg(4000, 3000)));
-  EXPECT_TRUE(isSlow(png(1000, 501)));
-  EXPECT_FALSE(isSlow(png(1000, 500)));
+  EXPECT_TRUE(isSlow(png(500, 301)));
+  EXPECT_FALSE(isSlow(png(500, 300)));
   EXPECT_FALSE(isSlow("words"));
   EXPECT_FALSE(ZQVPictureGate::isSlow("/nowhere.jpg"));
 }
