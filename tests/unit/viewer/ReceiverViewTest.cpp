@@ -288,6 +288,7 @@ class DownloadSignals : public ReceiverView {
   ~DownloadSignals() override { g_object_unref(_bus); }
 
   void emit(const char* member, GVariant* body) {
+    awaitSubscription();
     g_dbus_connection_emit_signal(_bus, nullptr, "/com/orlant/remoteshare",
                                   "org.tizen.call.remote.share", member, body, nullptr);
     g_dbus_connection_flush_sync(_bus, nullptr, nullptr);
@@ -309,6 +310,16 @@ class DownloadSignals : public ReceiverView {
   }
 
  private:
+  /// The page subscribes by a connection of its own; the bus answers in the order of the questions.
+  static void awaitSubscription() {
+    GDBusConnection* bus = g_bus_get_sync(G_BUS_TYPE_SYSTEM, nullptr, nullptr);
+    GVariant* id = g_dbus_connection_call_sync(bus, "org.freedesktop.DBus", "/org/freedesktop/DBus",
+                                               "org.freedesktop.DBus", "GetId", nullptr, nullptr,
+                                               G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr);
+    if (id) g_variant_unref(id);
+    g_object_unref(bus);
+  }
+
   GDBusConnection* _bus;
 };
 
