@@ -130,6 +130,15 @@ TEST_F(GridItem, ShowsAThumbnailThatHasArrived) {
   EXPECT_EQ(part("downstatus"), nullptr);
 }
 
+TEST_F(GridItem, HasAJpegDecodedWithAsManyPixelsAsTheCell) {
+  elm_gengrid_item_size_set(grid, 180, 160);
+  const std::string jpeg = picture("small.jpg", 320);
+  build(file("small.jpg", "image/jpeg", jpeg.c_str(), "url"), ZQV_VIEW_RECEIVER);
+  EXPECT_EQ(elm_image_prescale_get(part("thumbnail")), 180);
+  build(file("a.png", "image/png", photo.c_str(), "url"), ZQV_VIEW_RECEIVER);
+  EXPECT_EQ(elm_image_prescale_get(part("thumbnail")), 32);
+}
+
 TEST_F(GridItem, WaitsForNoPhotoThatHasNoThumbnail) {
   const std::string large = picture("large.jpg", kPhotoSide);
   build(file("large.jpg", "image/jpeg", large.c_str(), "url"), ZQV_VIEW_SENDER);
