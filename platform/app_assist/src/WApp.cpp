@@ -167,8 +167,9 @@ void WApp::Private::tearDown() {
   ecore_event_handler_del(visibility);
   if (refresh) ecore_job_del(refresh);
   WViewController* base = window ? window->getBaseViewController() : nullptr;
-  if (auto* naviframe = dynamic_cast<WNaviframeController*>(base))
+  if (auto* naviframe = dynamic_cast<WNaviframeController*>(base)) {
     naviframe->destroyAllViewControllers();
+  }
   LateDestroyer::instance().flush();
   self->onTerminate();
   window.reset();
