@@ -121,12 +121,13 @@ int load(PhoneScreen& screen, const Sight& sight, const char* token, double seco
   if (ms < 0) return printRace(ms);
   std::vector<double> answers;
   const double end = nowMs() + seconds * 1e3;
-  for (double at = nowMs(); at < end; at += kFrameMs) {
+  double at = nowMs();
+  while (at < end) {
     pauseUntil(at);
     const double answer = screen.askForLife(kPatienceMs);
     if (answer < 0) return fail("the window does not answer");
     answers.push_back(answer);
-    at = std::max(at, nowMs() - kFrameMs);
+    at = std::max(at + kFrameMs, nowMs());
   }
   std::sort(answers.begin(), answers.end());
   const auto late = std::count_if(answers.begin(), answers.end(),
@@ -217,6 +218,7 @@ double press(PhoneScreen& screen, const char* key) {
 int page(PhoneScreen& screen, int count, const char* how) {
   Frames frames;
   std::vector<double> times;
+  times.reserve(static_cast<size_t>(std::max(count, 0)));
   for (int i = 0; i < count; ++i) {
     times.push_back(strcmp(how, "swipe") == 0 ? swipe(screen, &frames) : press(screen, how));
   }

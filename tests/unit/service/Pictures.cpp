@@ -31,11 +31,11 @@ std::string chunk(const std::string& kind, const std::string& data) {
 }
 
 const guint8* pixelAt(GdkPixbuf* picture, double x, double y) {
-  const int channels = gdk_pixbuf_get_n_channels(picture);
-  const int column = static_cast<int>(x * gdk_pixbuf_get_width(picture));
-  const int row = static_cast<int>(y * gdk_pixbuf_get_height(picture));
-  return gdk_pixbuf_read_pixels(picture) + row * gdk_pixbuf_get_rowstride(picture) +
-         column * channels;
+  const auto channels = static_cast<size_t>(gdk_pixbuf_get_n_channels(picture));
+  const auto rowstride = static_cast<size_t>(gdk_pixbuf_get_rowstride(picture));
+  const auto column = static_cast<size_t>(x * gdk_pixbuf_get_width(picture));
+  const auto row = static_cast<size_t>(y * gdk_pixbuf_get_height(picture));
+  return gdk_pixbuf_read_pixels(picture) + row * rowstride + column * channels;
 }
 
 bool isRed(GdkPixbuf* picture, double x, double y) {
@@ -52,7 +52,7 @@ std::string encoded(GdkPixbuf* picture, const char* format) {
   gchar* bytes = nullptr;
   gsize size = 0;
   gdk_pixbuf_save_to_buffer(picture, &bytes, &size, format, nullptr, nullptr);
-  const std::string text(bytes, size);
+  std::string text(bytes, size);
   g_free(bytes);
   return text;
 }

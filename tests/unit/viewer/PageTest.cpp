@@ -71,7 +71,7 @@ std::string PageTest::picture(const char* name, int side) {
     char path[] = "/tmp/pages.XXXXXX";
     return std::string(mkdtemp(path));
   }();
-  const std::string path = folder + "/" + name;
+  std::string path = folder + "/" + name;
   Ecore_Evas* canvas = ecore_evas_buffer_new(8, 8);
   Evas_Object* image = evas_object_image_filled_add(ecore_evas_get(canvas));
   evas_object_image_size_set(image, side, side);

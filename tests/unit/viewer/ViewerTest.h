@@ -32,7 +32,7 @@ class ViewerTest : public testing::Test {
 
 /// A text that the viewer hands out, as a string; "(null)" for null.
 inline std::string taken(char* text) {
-  const std::string copy = text ? text : "(null)";
+  std::string copy = text ? text : "(null)";
   g_free(text);
   return copy;
 }
