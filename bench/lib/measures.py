@@ -324,7 +324,7 @@ def _page_viewer(subject, paths, turns):
     subject.call("painted", 4)
     subject.call("tap", os.path.basename(paths[0]))
     time.sleep(2)
-    # The files themselves in the grid are another matter: each is mapped while its cell is there.
+    # The grid that the pages came from is another matter.
     subject.forget_peak("zelqo-viewer")
     result = subject.stopwatch("page", turns, "swipe")
     result["peak"] = subject.memory("zelqo-viewer", "VmHWM")

@@ -13,10 +13,12 @@ class ZQVPictureGate {
   /// exist and a null path are refused silently.
   static bool passes(const char* path, Use use);
 
-  /// Can its loader decode it at a fraction of its size?
-  static bool isReducible(const char* path);
+  /// What decoding a picture is like; nothing of it for what is none.
+  struct Decoding {
+    bool isReducible = false;  ///< its loader can decode it at a fraction of its size
+    bool isSlow = false;       ///< for a small cell it takes longer than a frame may
+  };
+  static Decoding decodingOf(const char* path);
   /// May it be decoded before anybody asks to see it in full view? Nothing is logged.
   static bool isLight(const char* path);
-  /// Does decoding it for a small cell take longer than a frame may?
-  static bool isSlow(const char* path);
 };

@@ -170,10 +170,11 @@ bool ZQVPictureGate::passes(const char* path, Use use) {
   return reason == nullptr;
 }
 
-bool ZQVPictureGate::isReducible(const char* path) {
+ZQVPictureGate::Decoding ZQVPictureGate::decodingOf(const char* path) {
   const OpenFile file(path);
   PictureSize size;
-  return file.isOpen() && readSize(file, &size) && size.reducible;
+  if (!file.isOpen() || !readSize(file, &size)) return {};
+  return {size.reducible, size.pixels() > kMostQuickPixels};
 }
 
 bool ZQVPictureGate::isLight(const char* path) {
@@ -181,10 +182,4 @@ bool ZQVPictureGate::isLight(const char* path) {
   PictureSize size;
   if (!file.isOpen() || refusalOf(file, FullView) || !readSize(file, &size)) return false;
   return size.reducible || size.pixels() <= kMostLightPixels;
-}
-
-bool ZQVPictureGate::isSlow(const char* path) {
-  const OpenFile file(path);
-  PictureSize size;
-  return file.isOpen() && readSize(file, &size) && size.pixels() > kMostQuickPixels;
 }

@@ -17,7 +17,7 @@ int ZQVScreenPicture::sizeOn(Evas_Object* pager, const char* path) {
   elm_gengrid_item_size_get(pager, &width, &height);
   if (width <= 0 || height <= 0) return 0;
   // Other kinds are decoded whole whatever the prescale; a new one would decode them once more.
-  if (!ZQVPictureGate::isReducible(path)) return kFirstSize;
+  if (!ZQVPictureGate::decodingOf(path).isReducible) return kFirstSize;
   return std::max({width, height, kFirstSize});
 }
 

@@ -62,10 +62,10 @@ bool isScrolled(Evas_Object* grid) {
   return y > 0;
 }
 
-/// A JPEG is decoded at a fraction of its size: as many pixels as the cell has, or they are seen.
-void setPrescale(Evas_Object* icon, Evas_Object* grid, const char* path) {
+/// A picture that is decoded at a fraction of its size gets as many pixels as the cell has.
+void setPrescale(Evas_Object* icon, Evas_Object* grid, bool isReducible) {
   elm_image_prescale_set(icon, kPrescale);
-  if (!ZQVPictureGate::isReducible(path)) return;
+  if (!isReducible) return;
   int width = 0;
   int height = 0;
   elm_gengrid_item_size_get(grid, &width, &height);
@@ -75,13 +75,12 @@ void setPrescale(Evas_Object* icon, Evas_Object* grid, const char* path) {
 /// A prescale that is set last ends the preloading: a page is there with all its thumbnails. When
 /// it is scrolled nothing waits for a picture, nor ever for a photo that has no thumbnail.
 void setUpDecoding(Evas_Object* icon, Evas_Object* grid, const char* path) {
-  const bool later = isScrolled(grid) || ZQVPictureGate::isSlow(path);
-  if (later) {
-    setPrescale(icon, grid, path);
-    ZQVFilePages::dropWhenDecoded(elm_image_object_get(icon));
-  }
+  const ZQVPictureGate::Decoding decoding = ZQVPictureGate::decodingOf(path);
+  const bool later = isScrolled(grid) || decoding.isSlow;
+  if (later) setPrescale(icon, grid, decoding.isReducible);
+  if (later && decoding.isReducible) ZQVFilePages::dropWhenDecoded(elm_image_object_get(icon));
   elm_image_preload_disabled_set(icon, EINA_FALSE);
-  if (!later) setPrescale(icon, grid, path);
+  if (!later) setPrescale(icon, grid, decoding.isReducible);
 }
 
 void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {

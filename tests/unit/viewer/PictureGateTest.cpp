@@ -165,13 +165,13 @@ TEST_F(PictureGate, KnowsWhichPicturesMayBeDecodedAhead) {
 
 TEST_F(PictureGate, KnowsWhichPicturesTakeLong) {
   const auto isSlow = [this](const std::string& content) {
-    return ZQVPictureGate::isSlow(file(content).c_str());
+    return ZQVPictureGate::decodingOf(file(content).c_str()).isSlow;
   };
   EXPECT_TRUE(isSlow(jpeg(4000, 3000)));
   EXPECT_TRUE(isSlow(png(500, 301)));
   EXPECT_FALSE(isSlow(png(500, 300)));
   EXPECT_FALSE(isSlow("words"));
-  EXPECT_FALSE(ZQVPictureGate::isSlow("/nowhere.jpg"));
+  EXPECT_FALSE(ZQVPictureGate::decodingOf("/nowhere.jpg").isSlow);
 }
 
 TEST_F(PictureGate, IsSilentAboutWhatIsNotThere) {
