@@ -3,11 +3,14 @@
 #include <gtest/gtest.h>
 #include <libintl.h>
 #include <printf.h>
+#include <unicode/ubidi.h>
+#include <unicode/unistr.h>
 
 #include <array>
 #include <clocale>
 #include <cstdlib>
 #include <cstring>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -103,6 +106,19 @@ int columns(const char* text) {
   return sum;
 }
 
+/// The letters from left to right, as a screen shows a line of their direction.
+std::string fromLeftToRight(const icu::UnicodeString& letters) {
+  UErrorCode status = U_ZERO_ERROR;
+  const std::unique_ptr<UBiDi, decltype(&ubidi_close)> order(ubidi_open(), ubidi_close);
+  ubidi_setPara(order.get(), letters.getBuffer(), letters.length(), UBIDI_DEFAULT_LTR, nullptr,
+                &status);
+  std::vector<UChar> shown(letters.length() + 1);
+  const int length = ubidi_writeReordered(order.get(), shown.data(), letters.length(),
+                                          UBIDI_REMOVE_BIDI_CONTROLS, &status);
+  std::string text;
+  return icu::UnicodeString(shown.data(), length).toUTF8String(text);
+}
+
 class Catalogue : public testing::TestWithParam<const char*> {
  protected:
   static void SetUpTestSuite() {
@@ -120,6 +136,9 @@ class Catalogue : public testing::TestWithParam<const char*> {
   }
 
   static std::string text(const char* id) { return dgettext(kViewer, id); }
+  bool isReadFromTheRight() const {
+    return strcmp(GetParam(), "ar") == 0 || strcmp(GetParam(), "he") == 0;
+  }
 };
 
 TEST_P(Catalogue, TranslatesEveryIdentifier) {
@@ -188,6 +207,15 @@ TEST_P(Catalogue, NamesTheSameButtonAlikeInBothDomains) {
   for (const char* id : {"IDS_TPLATFORM_ACBUTTON_CANCEL_ABB", "IDS_TPLATFORM_ACBUTTON_DONE_ABB"}) {
     EXPECT_STREQ(dgettext(kViewer, id), dgettext(kPlatform, id));
   }
+}
+
+TEST_P(Catalogue, HasTheSizeReadAfterTheNumberOfFiles) {
+  auto summary = icu::UnicodeString::fromUTF8(text("IDS_RSH_SBODY_P1SD_FILES_HP2SS_P3SS_ABB"));
+  summary.findAndReplace("%1$d", "15").findAndReplace("%2$s", "6.96").findAndReplace("%3$s", "MB");
+  const std::string line = fromLeftToRight(summary);
+  const size_t count = line.find("15"), size = line.find("6.96 MB");
+  ASSERT_TRUE(count != std::string::npos && size != std::string::npos) << line;
+  EXPECT_EQ(count > size, isReadFromTheRight()) << line;
 }
 
 /// What a screen reader says of a file; the English words are their own identifiers.
