@@ -44,6 +44,10 @@ bool refresh(Evas_Object* object, const char* type) {
   } else if (strcmp(type, "elm_genlist") == 0) {
     elm_genlist_realized_items_update(object);
   } else {
+    // Neither asks for the room of its larger text by itself.
+    if (strcmp(type, "elm_button") == 0 || strcmp(type, "elm_check") == 0) {
+      elm_layout_sizing_eval(object);
+    }
     return true;
   }
   return false;

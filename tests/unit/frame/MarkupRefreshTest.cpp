@@ -41,7 +41,31 @@ TEST(MarkupRefresh, LeavesWhatItDoesNotKnow) {
   }
 }
 
-class ShownTexts : public FrameTest {};
+class ShownTexts : public FrameTest {
+ protected:
+  ~ShownTexts() override { edje_text_class_set("label", nullptr, -100); }
+
+  /// What a button asks for.
+  static int roomOf(Evas_Object* button) {
+    int width = 0;
+    evas_object_size_hint_min_get(button, &width, nullptr);
+    return width;
+  }
+  /// A button with a text that is wider than a button needs to be.
+  Evas_Object* button(const char* style) {
+    Evas_Object* button = elm_button_add(pushed("page")->getEvasObj());
+    elm_object_style_set(button, style);
+    const int empty = roomOf(button);
+    elm_object_text_set(button, "Herunterladen");
+    evas_object_show(button);
+    EXPECT_TRUE(waitUntil([&] { return roomOf(button) > empty; }));
+    return button;
+  }
+  void doubleTheTexts() {
+    edje_text_class_set("label", nullptr, -200);
+    app_assist::refreshTexts(window->getEvasObj());
+  }
+};
 
 TEST_F(ShownTexts, FollowAChangeOfTheirClass) {
   FakePage* page = pushed("page");
@@ -76,4 +100,19 @@ TEST_F(ShownTexts, OfAGridAreAskedForAgain) {
   app_assist::refreshTexts(window->getEvasObj());
   EXPECT_TRUE(waitUntil([] { return asked > 0; }));
   elm_gengrid_item_class_free(cell);
+}
+
+TEST_F(ShownTexts, OfAButtonGetMoreRoom) {
+  Evas_Object* download = button("default");
+  const int before = roomOf(download);
+  doubleTheTexts();
+  EXPECT_TRUE(waitUntil([&] { return roomOf(download) > before * 3 / 2; }));
+}
+
+TEST_F(ShownTexts, OfAButtonBesideTheTitleStayAsLargeAsTheTitle) {
+  Evas_Object* cancel = button("naviframe/title_left");
+  const int before = roomOf(cancel);
+  doubleTheTexts();
+  passLoop();
+  EXPECT_EQ(roomOf(cancel), before);
 }
