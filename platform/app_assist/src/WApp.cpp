@@ -63,7 +63,10 @@ struct WApp::Private {
   static void textSizeCb(keynode_t*, void* data);
 };
 
-WApp::WApp(int, char**) : _d(std::make_unique<Private>(this)) {}
+WApp::WApp(int, char**) {
+  std::set_new_handler(outOfMemory);
+  _d = std::make_unique<Private>(this);
+}
 
 WApp::~WApp() {
   if (theApp == this) theApp = nullptr;
@@ -89,7 +92,6 @@ void WApp::onAppControl(app_control_h) {}
 int WApp::start(int argc, char** argv) {
   theApp = this;
   limitFreedMemory();
-  std::set_new_handler(outOfMemory);
   // They tell of clock, locale and power, which the platform does itself, and wait for the system
   // bus as long as it takes.
   setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);

@@ -9,6 +9,7 @@
 #include <csignal>
 #include <cstdlib>
 #include <functional>
+#include <new>
 
 #include "FramePages.h"
 
@@ -142,6 +143,16 @@ TEST_F(App, IsKnownWhileItRuns) {
   run();
   EXPECT_EQ(known, &app);
   EXPECT_EQ(WApp::getInstance(), nullptr);
+}
+
+TEST_F(App, SaysFromItsBeginningOnWhenThereIsNoMemory) {
+  const auto runOutOfMemory = [&] {
+    std::set_new_handler(nullptr);
+    const FakeApp another(record);
+    std::get_new_handler()();
+  };
+  EXPECT_EXIT(runOutOfMemory(), testing::ExitedWithCode(EXIT_FAILURE),
+              "F/APP_ASSIST\\([ 0-9]+\\): out of memory");
 }
 
 TEST_F(App, EndsAtOnceWhenItDoesNotStart) {
