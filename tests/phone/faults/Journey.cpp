@@ -1,5 +1,13 @@
 #include "Journey.h"
 
+#include <filesystem>
+#include <fstream>
+
+#include "Picture.h"
+#include "ViewerSetting.h"
+
+namespace fs = std::filesystem;
+using phone::makePicture;
 using phone::thePhone;
 using phone::Words;
 
@@ -8,16 +16,30 @@ namespace {
 constexpr const char* kFriend = "+821011112222";
 constexpr const char* kOwnNumber = "+821012345678";
 
+/// A text that can be opened, and pictures that have thumbnails.
 Words files() {
-  return {thePhone().makeFile("File 1.txt"), thePhone().makeFile("File 2.txt"),
-          thePhone().makeFile("File 3.txt")};
+  const std::string text = thePhone().makeFile("File 1.txt", 0);
+  std::ofstream(text) << "A text that a program for texts opens.\n";
+  return {text, makePicture(thePhone(), "File 2.jpg", phone::kRed),
+          makePicture(thePhone(), "File 3.jpg", phone::kBlue)};
 }
 
 }  // namespace
 
 Journey::Journey()
     : _received(thePhone().share(files())),
-      _sent(thePhone().shareTo(kFriend, kOwnNumber, files())) {}
+      _sent(thePhone().shareTo(kFriend, kOwnNumber, files())),
+      _editor(ViewerSetting::outside("share/applications/l3afpad.desktop")) {
+  for (const auto& file : fs::directory_iterator(ViewerSetting::outside("media/Downloads"))) {
+    fs::remove_all(file);
+  }
+  std::ofstream(_editor) << "[Desktop Entry]\nType=Application\nName=Nothing\nExec=true %f\n"
+                            "MimeType=text/plain;\n";
+}
+
+Journey::~Journey() {
+  fs::remove(_editor);
+}
 
 bool Journey::go(LoopWatch& watch) const {
   using namespace place;
@@ -37,8 +59,7 @@ bool Journey::go(LoopWatch& watch) const {
     return watch.rest() != "silent";
   };
   return launch("view_type=received contents_token=" + _received.token) &&
-         touch({kFirstCell, kBottomButton}) && back() &&
-         touch({kBottomButton, kSelectAll, kDone}) &&
+         touch({kFirstCell, kDownload, kOpen}) && back() && touch({kDownload, kSelectAll, kDone}) &&
          launch("view_type=sent request_id=" + std::to_string(_sent.request)) &&
-         touch({kRecall, kCancel, kReshare}) && back();
+         touch({kReshare}) && back() && touch({kRecall, kOk});
 }

@@ -29,6 +29,10 @@ ViewerSetting::ViewerSetting(const phone::Words& environment) {
 }
 
 ViewerSetting::~ViewerSetting() {
+  lift();
+}
+
+void ViewerSetting::lift() {
   fs::remove(starter());
 }
 

@@ -8,13 +8,16 @@
 
 class ViewerSetting {
  public:
-  /// From the next start of the viewer until this object goes: NAME=VALUE texts.
+  /// From the next start of the viewer until this object goes or is lifted: NAME=VALUE texts.
   explicit ViewerSetting(const phone::Words& environment);
   ~ViewerSetting();
   ViewerSetting(const ViewerSetting&) = delete;
   ViewerSetting& operator=(const ViewerSetting&) = delete;
 
-  /// What ended since then: exit statuses, as a shell gives them.
+  /// The next start is as usual.
+  void lift();
+
+  /// What ended since the beginning: exit statuses, as a shell gives them.
   std::vector<int> endings() const;
 
   /// Where a file is for the viewer and for this test.

@@ -2,26 +2,32 @@
 //
 //   FAILING=malloc|new|open|write|connect|store   what is to fail
 //   FAILING_AT=N        the N-th of them in the process; with FAILING_ON=1 all that follow, too
-//   FAILING_COUNT=FILE  each of them adds a line to the file
+//   FAILING_AT=each     only with new: each of them, in a process of its own that goes no further
+//   FAILING_COUNT=FILE  each of them adds a line to the file; with FAILING_AT=each the line says
+//   how
+//                       that process ended, as a shell gives it
 //   FAILING_CLOCK=FILE  the first eight bytes are seconds by which the clock of the day is wrong
 //
-// malloc and new count where our own code calls them; open where it is about the phone's files;
-// write where it goes to a file; connect unless it is the screen's; store is a folder that cannot
-// be written.
+// malloc and new count where our own code calls them, new also where the standard library does;
+// open where it is about the phone's files; write where it goes to a file; connect unless it is the
+// screen's; store is a folder that cannot be written.
 
 #include <dlfcn.h>
 #include <fcntl.h>
 #include <link.h>
+#include <sched.h>
 #include <sys/mman.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/time.h>
 #include <sys/un.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <cerrno>
 #include <cstdarg>
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <ctime>
@@ -46,6 +52,7 @@ struct Plan {
   const char* what = "";
   long at = 0;
   bool goesOn = false;
+  bool triesEach = false;
   int record = -1;
   const int64_t* clock = nullptr;
   Range ours[kMostModules] = {};
@@ -62,8 +69,9 @@ Function real(const char* name) {
 }
 
 int addModule(dl_phdr_info* module, size_t, void*) {
-  const bool isProgram = !module->dlpi_name || !*module->dlpi_name;
-  if (!isProgram && !strstr(module->dlpi_name, "/libzelqo-")) return 0;
+  const char* name = module->dlpi_name ? module->dlpi_name : "";
+  const bool servesUs = strcmp(plan.what, "new") == 0 && strstr(name, "/libstdc++");
+  if (*name && !strstr(name, "/libzelqo-") && !servesUs) return 0;
   for (int i = 0; i < module->dlpi_phnum; i++) {
     const auto& part = module->dlpi_phdr[i];
     if (part.p_type != PT_LOAD || !(part.p_flags & PF_X) || plan.modules == kMostModules) continue;
@@ -85,8 +93,9 @@ __attribute__((constructor)) void begin() {
   const char* at = getenv("FAILING_AT");
   const char* count = getenv("FAILING_COUNT");
   if (const char* clock = getenv("FAILING_CLOCK")) plan.clock = mapClock(clock);
-  dl_iterate_phdr(addModule, nullptr);
   plan.what = what ? what : "";
+  dl_iterate_phdr(addModule, nullptr);
+  plan.triesEach = at && strcmp(at, "each") == 0;
   plan.at = at ? atol(at) : 0;
   plan.goesOn = getenv("FAILING_ON") != nullptr;
   if (count) plan.record = open(count, O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC, 0644);
@@ -101,16 +110,40 @@ bool isOurs(const void* caller) {
   return false;
 }
 
+void record(const char* line, size_t size) {
+  if (plan.record < 0) return;
+  isInside = true;
+  [[maybe_unused]] const ssize_t written = write(plan.record, line, size);
+  isInside = false;
+}
+
 /// Whether this call has to fail.
 bool strikes(const char* what) {
   if (!plan.isOn || isInside || strcmp(plan.what, what) != 0) return false;
   const long number = __atomic_add_fetch(&calls, 1, __ATOMIC_RELAXED);
-  if (plan.record >= 0) {
-    isInside = true;
-    [[maybe_unused]] const ssize_t written = write(plan.record, "\n", 1);
-    isInside = false;
-  }
+  record("\n", 1);
   return plan.at && (plan.goesOn ? number >= plan.at : number == plan.at);
+}
+
+int goWithoutMemory(void*) {
+  if (const auto handler = std::get_new_handler()) handler();
+  abort();  // as when nobody catches
+}
+
+/// What becomes of the process when there is no memory now: seen in one that shares ours, while
+/// this thread waits.
+void tryWithoutMemory() {
+  const int error = errno;
+  alignas(16) char stack[32 * 1024];
+  isInside = true;
+  int status = -1;
+  const int process = clone(goWithoutMemory, stack + sizeof stack, CLONE_VM | CLONE_VFORK, nullptr);
+  if (process > 0) waitpid(process, &status, __WCLONE);
+  isInside = false;
+  char line[16];
+  const int ended = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+  record(line, static_cast<size_t>(snprintf(line, sizeof line, "%d\n", ended)));
+  errno = error;
 }
 
 bool allocationStrikes(const char* what, const void* caller) {
@@ -153,7 +186,8 @@ time_t wrong() {
 }  // namespace
 
 void* operator new(size_t size) {
-  if (allocationStrikes("new", __builtin_return_address(0))) {
+  if (plan.triesEach && !isInside && isOurs(__builtin_return_address(0))) tryWithoutMemory();
+  if (!plan.triesEach && allocationStrikes("new", __builtin_return_address(0))) {
     if (const auto handler = std::get_new_handler()) handler();
     throw std::bad_alloc();
   }
