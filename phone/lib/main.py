@@ -19,8 +19,8 @@ COMMANDS = {
     "painted": "screen",
     "network": "world", "rotate": "world", "battery": "world",
     "signal": "world", "signals": "world",
-    "clock": "world", "language": "world", "account": "world", "service": "world",
-    "contact": "world",
+    "clock": "world", "language": "world", "theme": "world", "textsize": "world",
+    "account": "world", "service": "world", "contact": "world",
     "shell": "shell",
 }
 USAGE = "phone [--state DIR] COMMAND; commands: " + ", ".join(COMMANDS)

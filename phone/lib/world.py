@@ -66,6 +66,18 @@ def language(state, args):
                             "db/menu_widget/language", name])
 
 
+def theme(state, args):
+    return link.run(state, [state.tool("phone-vconf"), "set", "db/setting/theme",
+                            _choice(args, ("light", "dark"), "phone theme light|dark")])
+
+
+def textsize(state, args):
+    word = parse(args, words=(1, 1), usage="phone textsize PERCENT").words[0]
+    return link.run(state, [state.tool("phone-vconf"), "set-int",
+                            "db/setting/accessibility/font_size",
+                            str(number(word, "the size of texts", 80, 200))])
+
+
 def account(state, args):
     what = _choice(args, ("none", "off", "on"), "phone account none|off|on")
     return link.run(state, [state.tool("phone-account"), what, state.settings()["number"]])

@@ -157,6 +157,8 @@ TEST(PhoneCommand, SaysInOneLineWhatIsWrongWithItsArguments) {
       {{"network", "pigeon"}, "pigeon"},
       {{"account", "maybe"}, "maybe"},
       {{"clock", "13"}, "13"},
+      {{"theme", "pink"}, "pink"},
+      {{"textsize", "500"}, "size of texts"},
       {{"service", "slow"}, "milliseconds"},
       {{"service", "sideways"}, "sideways"},
       {{"contact", "add", "Nobody"}, "contact"},

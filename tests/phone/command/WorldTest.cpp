@@ -118,6 +118,19 @@ TEST(PhoneLanguage, IsThatOfEverythingThatStartsLater) {
   EXPECT_EQ(phone({"shell", "sh", "-c", "echo $LANG"}), "en_US.UTF-8\n");
 }
 
+TEST(PhoneLook, IsWhatTheApplicationsFollow) {
+  const auto setting = [](const char* key) {
+    return thePhone()({"shell", PHONE_VCONF, "get", key});
+  };
+  thePhone()({"theme", "dark"});
+  EXPECT_EQ(setting("db/setting/theme"), "dark\n");
+  thePhone()({"theme", "light"});
+  EXPECT_EQ(setting("db/setting/theme"), "light\n");
+  thePhone()({"textsize", "150"});
+  EXPECT_EQ(setting("db/setting/accessibility/font_size"), "150\n");
+  thePhone()({"textsize", "100"});
+}
+
 TEST(PhoneService, KeepsItsAddressThroughItsFaults) {
   Phone& phone = thePhone();
   const auto address = [&] {

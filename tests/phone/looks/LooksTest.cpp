@@ -133,10 +133,6 @@ void openExpired() {
   ASSERT_TRUE(comes("This share has expired"));
 }
 
-void setTextSize(const char* percent) {
-  thePhone()({"shell", VCONF, "set-int", "db/setting/accessibility/font_size", percent});
-}
-
 struct Page {
   const char* name;
   void (*open)();
@@ -262,9 +258,9 @@ TEST_P(Looks, AreRightInTheLanguages) {
   if (HasFatalFailure()) return;
   EXPECT_EQ(complaints("upright"), "");
   if (screen() == kMiddleScreen) {
-    setTextSize(kLargestText);
+    thePhone()({"textsize", kLargestText});
     EXPECT_EQ(complaints("larger"), "");
-    setTextSize("100");
+    thePhone()({"textsize", "100"});
   }
   thePhone()({"rotate", "90"});
   EXPECT_EQ(complaints("lying"), "");
