@@ -6,6 +6,7 @@ import os
 import shutil
 import sqlite3
 import subprocess
+import tempfile
 import time
 
 ROOT = os.path.dirname(os.path.dirname(os.path.dirname(os.path.abspath(__file__))))
@@ -127,8 +128,11 @@ class Subject:
 
     def forget_thumbnails(self, keys):
         """Nothing of them is on the phone any more."""
+        # A file system may be slow to make new files where many have just been deleted.
+        away = tempfile.mkdtemp(dir=self.path("opt-usr"))
         for name in ("thumbnail", "fullview_thumbnail"):
-            shutil.rmtree(self.path(SHARED, name), ignore_errors=True)
+            with contextlib.suppress(FileNotFoundError):
+                os.rename(self.path(SHARED, name), os.path.join(away, name))
         with contextlib.closing(self._preferences()) as base, base:
             base.executemany("DELETE FROM pref WHERE k = ?", [(key,) for key in keys])
 

@@ -20,6 +20,7 @@
 #include "MarkupRefresh.h"
 #include "MemoryUse.h"
 #include "SettingKeys.h"
+#include "Threads.h"
 #include "WindowPrivate.h"
 #include "app_assist/WNaviframeController.h"
 
@@ -92,6 +93,7 @@ void WApp::onAppControl(app_control_h) {}
 int WApp::start(int argc, char** argv) {
   theApp = this;
   limitFreedMemory();
+  paintInMainThread();
   // They tell of clock, locale and power, which the platform does itself, and wait for the system
   // bus as long as it takes.
   setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);
@@ -142,6 +144,7 @@ bool WApp::Private::setUpToolkit() {
   }
   installGlibBridge();
   limitCaches();
+  limitDecodingThreads();
   followSettings(true);
   Language::bindCatalogues();
   Language::begin();

@@ -200,6 +200,40 @@ TEST_F(App, KeepsLittleOfWhatIsNoLongerShown) {
   EXPECT_LE(eina_freeq_mem_max_get(eina_freeq_main_get()), static_cast<size_t>(kMegabyte));
 }
 
+TEST_F(App, PaintsAFrameInOneGo) {
+  struct Frame {
+    double begun = 0;
+    double painted = 0;
+  } frame;
+  app.atCreate = [&] {
+    Evas* canvas = evas_object_evas_get(app.getWindowController()->getEvasObj());
+    evas_event_callback_add(
+        canvas, EVAS_CALLBACK_RENDER_PRE,
+        [](void* data, Evas*, void*) { static_cast<Frame*>(data)->begun = ecore_loop_time_get(); },
+        &frame);
+    evas_event_callback_add(
+        canvas, EVAS_CALLBACK_RENDER_POST,
+        [](void* data, Evas*, void*) {
+          static_cast<Frame*>(data)->painted = ecore_loop_time_get();
+          elm_exit();
+        },
+        &frame);
+  };
+  run();
+  EXPECT_GT(frame.begun, 0);
+  EXPECT_EQ(frame.begun, frame.painted);
+}
+
+TEST_F(App, DecodesPicturesWithTwoThreads) {
+  int threads = 0;
+  app.atCreate = [&] {
+    threads = ecore_thread_max_get();
+    launchMyself("op");
+  };
+  run();
+  EXPECT_EQ(threads, 2);
+}
+
 TEST_F(App, SpeaksTheNewLanguageBeforeTheApplicationHearsOfIt) {
   static std::string heard;
   heard.clear();
