@@ -20,6 +20,8 @@ using phone::Words;
 
 namespace {
 
+constexpr std::chrono::milliseconds kLongestWait{1000};
+
 bool isClean(int status) {
   constexpr int kEndedBySignal = 128 + 15;
   return status == EXIT_SUCCESS || status == EXIT_FAILURE || status == kEndedBySignal;
@@ -39,6 +41,7 @@ bool saysWhy(const std::string& log) {
 struct Fault {
   Words environment;
   std::string counter, failing;
+  int ways;  ///< to go on, to see what the failure left behind
 
   Words at(const std::string& number) const {
     Words all = environment;
@@ -49,35 +52,38 @@ struct Fault {
 };
 
 Fault below(const char* what) {
-  return {
-      {"LD_PRELOAD=" FAILING_CALLS, std::string("FAILING=") + what}, "FAILING_COUNT", "FAILING_AT"};
+  return {{"LD_PRELOAD=" FAILING_CALLS, std::string("FAILING=") + what},
+          "FAILING_COUNT",
+          "FAILING_AT",
+          0};
 }
 
-const Fault kOfThePlatform{{}, "PLATFORM_COUNT_CALLS", "PLATFORM_FAIL_CALL"};
+const Fault kOfThePlatform{{}, "PLATFORM_COUNT_CALLS", "PLATFORM_FAIL_CALL", 1};
 
 class FailingCalls : public testing::Test {
  protected:
   void SetUp() override { thePhone().closeViewer(); }
   void TearDown() override { thePhone().closeViewer(); }
 
-  /// Goes all ways in that environment; the viewer has to stay sound, and to work afterwards. What
-  /// was counted on the ways.
-  Words go(const Words& environment) {
+  /// Goes the ways in that environment, up to that on which the `last` call was made and `more`
+  /// beyond it; the viewer has to stay sound, and to work afterwards. What was counted on the ways.
+  Words go(const Words& environment, size_t last = SIZE_MAX, int more = 0) {
     fs::remove(ViewerSetting::outside("calls"));
-    const size_t logged = thePhone().log().size();
     const Journey journey;
     ViewerSetting setting(environment);
-    EXPECT_TRUE(journey.go(_watch)) << "the viewer hangs";
+    bool isEnough = false;
+    const auto hasGoneFarEnough = [&] {
+      isEnough = counted().size() >= last && more-- == 0;
+      return isEnough;
+    };
+    _watch.begin();
+    EXPECT_TRUE(journey.go(_watch, hasGoneFarEnough)) << "the viewer hangs";
     const Words calls = counted();
     setting.lift();
-    if (!endsAfterRecall()) expectGoodHealth(journey);
+    if (isEnough || !endsAfterRecall()) expectGoodHealth(journey);
+    EXPECT_LE(_watch.longestWait().count(), kLongestWait.count());
     thePhone().end({"zelqo-viewer", "contacts-picker", "ovuport"});
-    EXPECT_TRUE(waitFor([&] { return !setting.endings().empty(); }));
-    const std::string log = thePhone().log().substr(logged);
-    for (const int status : setting.endings()) {
-      EXPECT_TRUE(isClean(status)) << "status " << status;
-      EXPECT_TRUE(status != EXIT_FAILURE || saysWhy(log)) << "the viewer went without a word";
-    }
+    expectCleanEndings(setting);
     return calls;
   }
   /// A fault may stop the recall; the viewer then stays.
@@ -85,8 +91,19 @@ class FailingCalls : public testing::Test {
     return waitFor([&] { return _watch.settle() == "gone"; }, std::chrono::milliseconds(600));
   }
   void expectGoodHealth(const Journey& journey) {
-    thePhone().launchReceived(journey.received().token);
+    _watch.run(PROGRAMS "/phone-launch launch_viewer view_type=received contents_token=" +
+               journey.received().token);
     EXPECT_TRUE(comes("File 1.txt"));
+  }
+  void expectCleanEndings(const ViewerSetting& setting) {
+    EXPECT_TRUE(waitFor([&] { return !setting.endings().empty(); }));
+    const std::string log = thePhone().log();
+    const std::string news = log.substr(std::min(_logged, log.size()));
+    _logged = log.size();
+    for (const int status : setting.endings()) {
+      EXPECT_TRUE(isClean(status)) << "status " << status;
+      EXPECT_TRUE(status != EXIT_FAILURE || saysWhy(news)) << "the viewer went without a word";
+    }
   }
 
   static Words counted() {
@@ -99,7 +116,7 @@ class FailingCalls : public testing::Test {
   /// Lets the n-th call fail. False when there are not as many.
   bool fail(const Fault& fault, size_t n) {
     SCOPED_TRACE("call " + std::to_string(n));
-    return go(fault.at(std::to_string(n))).size() >= n;
+    return go(fault.at(std::to_string(n)), n, fault.ways).size() >= n;
   }
 
   /// Lets one call after the other fail: the usual ones, or all that FAULTS wants, as many as there
@@ -121,6 +138,7 @@ class FailingCalls : public testing::Test {
   }
 
   LoopWatch _watch;
+  size_t _logged = thePhone().log().size();
 };
 
 class FailingCallsBelow : public FailingCalls {

@@ -2,6 +2,7 @@
 /// recall, with which the viewer ends. Touches places, whatever is there by then.
 #pragma once
 
+#include <functional>
 #include <string>
 
 #include "LoopWatch.h"
@@ -15,8 +16,9 @@ class Journey {
   Journey(const Journey&) = delete;
   Journey& operator=(const Journey&) = delete;
 
-  /// All ways, one after the other. False when the viewer once neither answered nor ended.
-  bool go(LoopWatch& watch) const;
+  /// All ways, one after the other, up to that which is enough. False when the viewer once neither
+  /// answered nor ended.
+  bool go(LoopWatch& watch, const std::function<bool()>& isEnough = {}) const;
 
   const phone::Share& received() const { return _received; }
   const phone::Share& sent() const { return _sent; }
