@@ -5,7 +5,6 @@
 #include <unistd.h>
 
 #include <cstdlib>
-#include <string>
 
 /// One file per fuzzing process whose content is the input, rewritten for each run.
 class TemporaryFile {

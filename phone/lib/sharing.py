@@ -13,7 +13,6 @@ class Sharing:
     def __init__(self, phone):
         self._phone = phone
         self._service = None
-        self._agent = None
         self._changing = threading.Lock()
         self.url = phone.settings["service"]
 
@@ -23,8 +22,7 @@ class Sharing:
         self._configure()
         agent = self._phone.tool("zelqo-agent")
         if agent and self.url:
-            self._agent = self._phone.program("agent", [agent])
-            self._agent.start()
+            self._phone.program("agent", [agent]).start()
 
     def change(self, mode, delay):
         """ok, down, slow (every answer delay milliseconds late), refuse (every request refused).

@@ -55,7 +55,7 @@ class Phone:
 
     def start(self):
         together(self._start_screen, self._start_session, self._start_system)
-        together(self._start_notifications, self._warm_contacts, self._configure_applications,
+        together(self._start_notifications, self._warm_contacts, self.sharing.start,
                  self._sign_up)
 
     def program(self, name, argv, env=None):
@@ -171,9 +171,6 @@ class Phone:
         self.program("notifications", ["dunst", "-conf", os.path.join(self.run, "dunstrc")]).start()
         buses.wait(self, "org.freedesktop.Notifications")
 
-    def _configure_applications(self):
-        self.sharing.start()
-
     def _sign_up(self):
         """A new phone has an account with the sharing service on. Later its user decides."""
         account = self.tool("phone-account")
@@ -197,11 +194,7 @@ class Phone:
         return {"display": self.display, "language": self.language, "service": self.sharing.url,
                 "programs": [{"name": program.name, "state": program.state()}
                              for program in self.programs],
-                "applications": applications(self.state) + self._running_applications()}
-
-    @staticmethod
-    def _running_applications():
-        return []
+                "applications": applications(self.state)}
 
     # --- ending ---
 

@@ -3,8 +3,6 @@
 
 #include <json-glib/json-glib.h>
 
-#include <string>
-
 #include "Share.h"
 
 namespace service {

@@ -4,7 +4,6 @@
 #include <libsoup/soup.h>
 
 #include <functional>
-#include <memory>
 #include <string>
 
 #include "Owned.h"

@@ -28,11 +28,10 @@ class ShareDesk {
   const char* complete(const Share& share);
   /// From now on nobody gets anything of it. Asking again changes nothing.
   bool recall(const Share& share);
-  /// Called after a share has been published or has expired before that.
+  /// Called after a share has been published.
   void setPublishedListener(std::function<void(std::int64_t id)> listener);
 
  private:
-  void makePictures(std::int64_t id, std::int64_t index, bool video);
   void picturesMade(std::int64_t id);
   void publishWhenReady(std::int64_t id);
   void publish(const Share& share);

@@ -85,7 +85,7 @@ void WriteSide::prepareUpload(SoupServerMessage* message, const Words& path) {
     answerError(message, SOUP_STATUS_REQUEST_ENTITY_TOO_LARGE, "longer than announced");
     return;
   }
-  // Shares without pictures of their own sizes may announce a wrong one.
+  // A lenient share may announce a wrong size.
   Upload::attach(message, _blobs.incoming(), share->lenient ? -1 : file->size.value_or(-1), limit);
 }
 

@@ -2,8 +2,6 @@
 
 #include <glib.h>
 
-#include <cstring>
-
 #include "ZQVCommon.h"
 #include "ZQVIcons.h"
 #include "ZQVOwned.h"

@@ -4,7 +4,6 @@
 #include <base/Bus.h>
 
 #include <cstdio>
-#include <memory>
 
 class Recorder {
  public:

@@ -2,7 +2,6 @@
 
 using common::Out;
 using common::OwnedError;
-using common::OwnedText;
 using common::OwnedVariant;
 
 namespace {

@@ -1,8 +1,6 @@
 /// The language of the texts: catalogues, locale, reading direction.
 #pragma once
 
-#include <string>
-
 namespace app_assist {
 
 class Language {

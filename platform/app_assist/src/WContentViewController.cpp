@@ -2,8 +2,6 @@
 
 #include <dlog.h>
 
-#include <algorithm>
-
 #include "ContentPrivate.h"
 #include "LateDestroyer.h"
 #include "PopupPrivate.h"

@@ -4,6 +4,7 @@
 #include <dlog.h>
 
 #include <cstdlib>
+#include <set>
 
 namespace base {
 namespace {

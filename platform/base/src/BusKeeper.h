@@ -4,7 +4,6 @@
 #include <base/Bus.h>
 
 #include <map>
-#include <set>
 
 namespace base {
 

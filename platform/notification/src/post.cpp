@@ -10,7 +10,7 @@
 namespace notification {
 namespace {
 
-constexpr int kShownMs = 10000;
+constexpr int kShownMs = 5000;
 
 using OnOpen = std::function<void()>;
 

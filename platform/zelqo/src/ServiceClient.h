@@ -3,7 +3,6 @@
 
 #include <functional>
 #include <list>
-#include <memory>
 #include <string>
 
 #include <common/Json.h>

@@ -1,7 +1,6 @@
 // The calls that answer from the store.
 #include <base/Fault.h>
 
-#include <cstdlib>
 #include <cstring>
 #include <limits>
 

@@ -8,7 +8,6 @@
 namespace fs = std::filesystem;
 using phone::Share;
 using phone::thePhone;
-using phone::waitFor;
 
 namespace {
 

@@ -12,7 +12,6 @@ using phone::makePicture;
 using phone::Share;
 using phone::thePhone;
 using phone::waitFor;
-using phone::Words;
 
 namespace {
 

@@ -3,8 +3,6 @@
 #include <gio/gio.h>
 #include <unistd.h>
 
-#include <fstream>
-
 #include "AlivePage.h"
 
 using phone::kBlue;
@@ -12,7 +10,6 @@ using phone::kGreen;
 using phone::makePicture;
 using phone::Share;
 using phone::thePhone;
-using phone::waitFor;
 
 namespace {
 

@@ -4,14 +4,11 @@
 // and the other direction. With the largest text, lines may end in dots, and nothing else changes.
 
 #include <filesystem>
-#include <fstream>
 #include <set>
 
 #include "FullPage.h"
 
 namespace fs = std::filesystem;
-using phone::Phone;
-using phone::Share;
 using phone::thePhone;
 using phone::Words;
 

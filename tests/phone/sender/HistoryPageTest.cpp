@@ -2,7 +2,6 @@
 
 #include "Screen.h"
 
-using phone::Share;
 using phone::thePhone;
 using phone::waitFor;
 

@@ -1,12 +1,10 @@
 // The page of a share that this phone has sent.
 
 #include <algorithm>
-#include <fstream>
 
 #include "Picture.h"
 #include "Screen.h"
 
-using phone::Share;
 using phone::thePhone;
 using phone::Tree;
 

@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 #include <ovu.h>
 
-#include <cstdlib>
 #include <filesystem>
 
 #include "../platform/TestPhone.h"

@@ -4,7 +4,6 @@
 #include <sys/time.h>
 
 #include <filesystem>
-#include <memory>
 #include <vector>
 
 #include "../platform/TestPhone.h"

@@ -1,7 +1,5 @@
 #include "FramePages.h"
 
-using app_assist::WNaviframeController;
-
 using Naviframe = FrameTest;
 
 TEST_F(Naviframe, BuildsAPageInOrder) {

@@ -7,7 +7,6 @@
 #include <ostream>
 #include <sstream>
 #include <string>
-#include <vector>
 
 #include "DeviceTheme.h"
 

@@ -6,7 +6,6 @@
 #include <app_control.h>
 #include <appfw/AppService.h>
 
-#include <memory>
 #include <string>
 #include <vector>
 

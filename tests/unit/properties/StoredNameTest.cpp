@@ -1,7 +1,6 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <fstream>
 
 #include "../downloads/TestFolder.h"
 #include "FileNamer.h"

@@ -2,7 +2,6 @@
 #include <unistd.h>
 
 #include <csignal>
-#include <cstdlib>
 
 #include "Pictures.h"
 #include "ServiceFixture.h"

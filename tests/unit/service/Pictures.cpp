@@ -3,7 +3,6 @@
 #include <gdk-pixbuf/gdk-pixbuf.h>
 
 #include <memory>
-#include <vector>
 
 namespace {
 

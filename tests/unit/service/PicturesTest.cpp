@@ -1,7 +1,5 @@
 #include "Pictures.h"
 
-#include <csignal>
-#include <cstdio>
 #include <cstdlib>
 
 #include "ServiceFixture.h"

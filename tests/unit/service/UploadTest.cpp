@@ -1,7 +1,6 @@
 #include <sys/resource.h>
 
 #include <filesystem>
-#include <fstream>
 
 #include "ServiceFixture.h"
 

@@ -2,7 +2,6 @@
 #include <system_settings.h>
 
 #include <algorithm>
-#include <fstream>
 
 #include "PageTest.h"
 #include "ZQVReceiverView.h"

@@ -1,6 +1,6 @@
 #include <efl_assist.h>
 
-#include <cctype>
+#include <fstream>
 
 #include "PageTest.h"
 #include "ZQVCommon.h"

@@ -4,7 +4,6 @@
 #include <contacts.h>
 #include <libintl.h>
 
-#include <algorithm>
 #include <random>
 
 using app_assist::WContentViewController;

@@ -2,6 +2,7 @@
 #include <unistd.h>
 
 #include <filesystem>
+#include <fstream>
 
 #include "ViewerTest.h"
 #include "ZQVPictureGate.h"

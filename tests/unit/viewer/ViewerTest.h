@@ -3,7 +3,6 @@
 #include <glib.h>
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <string>
 
 #include "FakeLog.h"

@@ -14,7 +14,6 @@
 using testing::Contains;
 using testing::ElementsAre;
 using testing::IsEmpty;
-using testing::Not;
 
 namespace {
 

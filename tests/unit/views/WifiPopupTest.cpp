@@ -4,7 +4,6 @@
 #include "ZQVUnableOpenFilePopup.h"
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 namespace {
 

@@ -5,6 +5,7 @@
 #include <base/PhonePaths.h>
 #include <companion/Launch.h>
 #include <companion/Text.h>
+#include <notification/post.h>
 #include <zelqo/Store.h>
 
 #include <cstdlib>
@@ -14,7 +15,6 @@
 #include "FileNamer.h"
 
 using companion::format;
-using companion::text;
 
 namespace downloads {
 namespace {
@@ -115,11 +115,11 @@ void DownloadApp::_notifyWhenComplete(const std::string& token) {
   const Batch batch = _batches[token];
   _batches.erase(token);
   if (batch.failed > 0) {
-    _notifier.post(failedText(batch.failed, batch.lastName), [this] { _showList(); });
+    notification::post(failedText(batch.failed, batch.lastName), [this] { _showList(); });
   } else if (batch.done > 0 && !token.empty()) {
-    _notifier.post(doneText(batch.done, batch.lastName), [token] { openShare(token); });
+    notification::post(doneText(batch.done, batch.lastName), [token] { openShare(token); });
   } else if (batch.done > 0) {
-    _notifier.post(doneText(batch.done, batch.lastName), [this] { _showList(); });
+    notification::post(doneText(batch.done, batch.lastName), [this] { _showList(); });
   }
 }
 

@@ -7,7 +7,6 @@
 #include <string>
 
 #include "DownloadManager.h"
-#include "DownloadNotifier.h"
 #include "DownloadSignals.h"
 #include "NetworkWatch.h"
 
@@ -47,7 +46,6 @@ class DownloadApp : public companion::CompanionApp, private DownloadManager::Obs
   void _notifyWhenComplete(const std::string& token);
 
   DownloadSignals _signals;
-  DownloadNotifier _notifier;
   std::unique_ptr<DownloadManager> _manager;
   std::unique_ptr<NetworkWatch> _network;
   std::map<std::string, Batch> _batches;  // by share, what ended since its last notification

@@ -7,7 +7,6 @@
 #include <mime_handler.h>
 
 #include <cstdlib>
-#include <memory>
 #include <string>
 #include <type_traits>
 

@@ -4,7 +4,6 @@
 #include <base/Bus.h>
 
 #include <functional>
-#include <string>
 
 namespace history {
 

@@ -1,4 +1,4 @@
-/// Ordinary notifications: shown for ten seconds, or until they are opened or dismissed.
+/// Ordinary notifications: shown for five seconds, or until they are opened or dismissed.
 #pragma once
 
 #include <functional>

@@ -18,7 +18,6 @@
 #include <vconf.h>
 
 #include <cerrno>
-#include <cstdlib>
 #include <cstring>
 #include <ctime>
 #include <list>

@@ -6,7 +6,6 @@
 #include <ovu.h>
 #include <zelqo.h>
 
-#include <cstdlib>
 #include <cstring>
 
 #include "FakePhone.h"
