@@ -13,7 +13,7 @@
 namespace {
 
 std::string shown(const std::string& markup) {
-  const ZQVOwned<char, free> text(evas_textblock_text_markup_to_utf8(nullptr, markup.c_str()));
+  const ZQVPlatformText text(evas_textblock_text_markup_to_utf8(nullptr, markup.c_str()));
   return text ? text.get() : "";
 }
 

@@ -20,7 +20,6 @@ class WGenlistItemMonoline : public app_assist::WGenlistItem {
 
  protected:
   static char* _textCb(void* data, Evas_Object* list, const char* part);
-  static void _deleteCb(void* data, Evas_Object* list);
 
  private:
   ZQVOwnedText _text;

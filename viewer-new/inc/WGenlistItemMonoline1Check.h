@@ -24,7 +24,6 @@ class WGenlistItemMonoline1Check : public app_assist::WGenlistItem {
  private:
   static char* _textCb(void* data, Evas_Object* list, const char* part);
   static Evas_Object* _contentCb(void* data, Evas_Object* list, const char* part);
-  static void _deleteCb(void* data, Evas_Object* list);
   Evas_Object* _createCheck(Evas_Object* parent);
   Evas_Object* _findCheck() const;
 

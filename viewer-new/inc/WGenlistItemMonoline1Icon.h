@@ -2,12 +2,7 @@
 
 #include <app_assist.h>
 
-#include "ZQVCommon.h"
 #include "ZQVOwned.h"
-
-/// The pictures that stand for people without one.
-#define ZQV_DEFAULT_CALLER_IMAGE ZQV_IMAGE_DIR "contacts_caller_id_default_02.png"
-#define ZQV_GROUP_CALLER_IMAGE ZQV_IMAGE_DIR "zq_caller_id_default_group.png"
 
 /// A row with one line of text and a person's picture in front of it.
 class WGenlistItemMonoline1Icon : public app_assist::WGenlistItem {
@@ -24,7 +19,6 @@ class WGenlistItemMonoline1Icon : public app_assist::WGenlistItem {
  private:
   static char* _textCb(void* data, Evas_Object* list, const char* part);
   static Evas_Object* _contentCb(void* data, Evas_Object* list, const char* part);
-  static void _deleteCb(void* data, Evas_Object* list);
   Evas_Object* _createImage(Evas_Object* parent) const;
 
   ZQVOwnedText _text;

@@ -4,10 +4,15 @@
 #include <stdint.h>
 #include <unicode/utypes.h>
 
+#include <string>
+
 /// Where the viewer's pictures lie.
 #define ZQV_IMAGE_DIR "/opt/usr/apps/com.orlant.zelqo/res/images/viewer-images/WVGA/"
 /// Where the download application puts files.
 #define ZQV_DOWNLOAD_DIR "/opt/usr/media/Downloads"
+
+/// The viewer's theme: the file of its layouts.
+std::string zqvThemeFile();
 
 /// Stateless utilities of the whole viewer. Texts that are returned are new and freed with g_free.
 class ZQViewerCommon {

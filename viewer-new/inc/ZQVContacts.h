@@ -5,6 +5,12 @@
 
 #include <string>
 
+#include "ZQVCommon.h"
+
+/// The pictures that stand for people without one.
+#define ZQV_DEFAULT_CALLER_IMAGE ZQV_IMAGE_DIR "contacts_caller_id_default_02.png"
+#define ZQV_GROUP_CALLER_IMAGE ZQV_IMAGE_DIR "zq_caller_id_default_group.png"
+
 /// People by phone number, as the phone's contacts know them.
 class ZQVContacts {
  public:

@@ -10,6 +10,9 @@ class ZQViewerThumbnailItem;
 /// the name cannot be a file's name.
 std::string zqvDownloadedPath(const ZQViewerThumbnailItem& item);
 
+/// Is there a file of this name in the download folder that came from the item's address?
+bool zqvIsDownloadedByName(const ZQViewerThumbnailItem& item);
+
 /// Has the file manager downloaded this file, and is it still there?
 bool zqvIsDownloaded(const ZQViewerThumbnailItem& item);
 

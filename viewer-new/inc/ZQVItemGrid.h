@@ -19,7 +19,7 @@ class ZQVItemGrid {
   /// Makes the gengrid without any layout of its own.
   Evas_Object* create(Evas_Object* parent);
 
-  /// Square cells for the window's rotation.
+  /// Square cells for the window's rotation; nothing without a gengrid.
   void fitCells(Evas_Object* window);
   /// Null when the gengrid took no cell.
   Elm_Object_Item* append(ZQViewerThumbnailItem* item, Evas_Smart_Cb selected, void* data);
@@ -29,6 +29,11 @@ class ZQVItemGrid {
   /// Tells screen readers what the cells are, in the language of now.
   void nameCells();
   void forgetCells();
+
+  /// The ZQVViewType of a gengrid; a grid that was reset, or null, has none.
+  static int viewTypeOf(Evas_Object* grid);
+  /// Makes a gengrid one of no type.
+  static void resetViewType(Evas_Object* grid);
 
   Evas_Object* get() const { return _grid; }
   ZQVViewType getViewType() const { return _viewType; }

@@ -9,8 +9,6 @@
 /// What a launch request says. Everything is optional; an extra of the wrong kind counts as absent.
 class ZQVLaunchRequest {
  public:
-  using Text = ZQVOwned<char, free>;
-
   /// `request` is borrowed.
   explicit ZQVLaunchRequest(app_control_h request);
 
@@ -22,14 +20,14 @@ class ZQVLaunchRequest {
   const char* viewType() const { return _viewType.get(); }
   const char* contentsToken() const { return _contentsToken.get(); }
   /// The files that a messaging application hands over.
-  std::vector<Text> files() const;
+  std::vector<ZQVPlatformText> files() const;
 
  private:
-  Text _extra(const char* key) const;
+  ZQVPlatformText _extra(const char* key) const;
 
   app_control_h _request;
-  Text _shareType;
-  Text _contentsToken;
-  Text _viewType;
-  Text _requestId;
+  ZQVPlatformText _shareType;
+  ZQVPlatformText _contentsToken;
+  ZQVPlatformText _viewType;
+  ZQVPlatformText _requestId;
 };

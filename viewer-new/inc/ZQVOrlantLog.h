@@ -4,6 +4,9 @@
 #include <orlant_log_manager.h>
 #include <stdint.h>
 
+/// How the viewer was entered: for a sent share or for a received one.
+enum ZQVEntry { ZQV_ENTRY_SENT = 3, ZQV_ENTRY_RECEIVED = 4 };
+
 /// Reports how the viewer is used to the platform's usage log, one record per operation. Records
 /// are fire-and-forget: nothing waits for them and no failure is told.
 class ZQVOrlantLog {
@@ -14,7 +17,7 @@ class ZQVOrlantLog {
 
   static ZQVOrlantLog& getInstance();
 
-  /// How the viewer was entered: 3 for a sent share, 4 for a received one.
+  /// `entry` is a ZQVEntry; any other counts as received.
   void insertEntryPath(app_control_h request, int entry);
   /// The kinds of files downloaded from the select view, by extension.
   void insertSelectDownloadContentstype(const char* const* extensions, int count);

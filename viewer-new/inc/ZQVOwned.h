@@ -7,6 +7,7 @@
 #include <glib.h>
 
 #include <cstddef>
+#include <cstdlib>
 #include <type_traits>
 #include <utility>
 
@@ -43,6 +44,9 @@ class ZQVOwned {
   T* _handle = nullptr;
 };
 
+/// A text of GLib's.
 using ZQVOwnedText = ZQVOwned<char, g_free>;
+/// A text that the platform gave away.
+using ZQVPlatformText = ZQVOwned<char, free>;
 using ZQVOwnedAppControl = ZQVOwned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
 using ZQVOwnedBundle = ZQVOwned<bundle, bundle_free>;

@@ -56,7 +56,6 @@ class ZQVReceiverView : public app_assist::WContentViewController {
   std::string _titleText() const;
   void _nameTitle();
   void _showSummary();
-  std::string _sizeLine() const;
   std::string _expiryLine() const;
   std::string _hint() const;
   void _launchDbusMonitor();

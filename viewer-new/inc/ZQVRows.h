@@ -5,9 +5,13 @@
 
 #include <initializer_list>
 
-/// A static item class: the toolkit neither counts nor frees it.
+/// A static item class, which the toolkit neither counts nor frees. Rows of it are deleted with
+/// their items.
 Elm_Genlist_Item_Class zqvRowClass(const char* style, Elm_Gen_Item_Text_Get_Cb text,
-                                   Elm_Gen_Item_Content_Get_Cb content, Elm_Gen_Item_Del_Cb del);
+                                   Elm_Gen_Item_Content_Get_Cb content);
+
+/// A list that keeps all its rows realised.
+Evas_Object* zqvCreateRowList(Evas_Object* parent);
 
 bool zqvIsOneOf(const char* part, std::initializer_list<const char*> parts);
 
@@ -24,6 +28,3 @@ template <typename Row>
 Row* zqvRowOf(void* data) {
   return static_cast<Row*>(static_cast<app_assist::WGenlistItem*>(data));
 }
-
-/// Keeps all rows of a list realised.
-void zqvRealizeAllRows(Evas_Object* list);

@@ -36,7 +36,6 @@ class ZQVSelectView : public app_assist::WContentViewController {
   static void _rotateCb(void* data, Evas_Object* window, void* info);
 
  private:
-  Evas_Object* _createList(Evas_Object* parent);
   Evas_Object* _createTitleButton(const char* style, const char* text, Evas_Smart_Cb clicked);
   void _toggleItem(Elm_Object_Item* cell);
   void _toggleAll(WGenlistItemMonoline1Check* row);

@@ -48,7 +48,6 @@ class ZQVSenderView : public app_assist::WContentViewController {
   static int _sendDbusSignalToHistory(ZQVSenderView* view, const char* member, const char* value);
 
  private:
-  Evas_Object* _createList(Evas_Object* parent);
   Evas_Object* _createToolbarButton(Evas_Object* box, const char* text, Evas_Smart_Cb clicked);
   void _fillList();
   std::string _groupTitle() const;

@@ -19,6 +19,12 @@ inline void zqvNamePage(const app_assist::WViewController& view, const std::stri
   zqvSetAccessibleName(elm_object_parent_widget_get(view.getEvasObj()), title);
 }
 
+/// Gives a widget that fills a page the pages' own background.
+inline void zqvColorPage(Evas_Object* widget) {
+  edje_object_color_class_set(elm_layout_edje_get(widget), "transparent", 229, 237, 240, 255, 0, 0,
+                              0, 0, 0, 0, 0, 0);
+}
+
 /// The arrow in front of a page's title; the naviframe becomes its owner with the push.
 inline Evas_Object* zqvAddBackButton(Evas_Object* naviframe, Evas_Smart_Cb clicked,
                                      const void* data) {

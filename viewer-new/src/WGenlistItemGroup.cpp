@@ -3,7 +3,7 @@
 #include "ZQVRows.h"
 
 Elm_Genlist_Item_Class* WGenlistItemGroup::getItemClass() {
-  static Elm_Genlist_Item_Class rowClass = zqvRowClass("group_index", _textCb, nullptr, _deleteCb);
+  static Elm_Genlist_Item_Class rowClass = zqvRowClass("group_index", _textCb, nullptr);
   return &rowClass;
 }
 

@@ -9,7 +9,7 @@ WGenlistItemMonoline::WGenlistItemMonoline(const char* text) {
 WGenlistItemMonoline::~WGenlistItemMonoline() = default;
 
 Elm_Genlist_Item_Class* WGenlistItemMonoline::getItemClass() {
-  static Elm_Genlist_Item_Class rowClass = zqvRowClass("1line", _textCb, nullptr, _deleteCb);
+  static Elm_Genlist_Item_Class rowClass = zqvRowClass("1line", _textCb, nullptr);
   return &rowClass;
 }
 
@@ -30,8 +30,4 @@ char* WGenlistItemMonoline::_textCb(void* data, Evas_Object*, const char* part) 
     return nullptr;
   }
   return zqvRowText(zqvRowOf<WGenlistItemMonoline>(data)->_text.get());
-}
-
-void WGenlistItemMonoline::_deleteCb(void* data, Evas_Object*) {
-  delete static_cast<app_assist::WGenlistItem*>(data);
 }

@@ -14,7 +14,7 @@ WGenlistItemMonoline1Check::WGenlistItemMonoline1Check(const char* text) : _text
 WGenlistItemMonoline1Check::~WGenlistItemMonoline1Check() = default;
 
 Elm_Genlist_Item_Class* WGenlistItemMonoline1Check::getItemClass() {
-  static Elm_Genlist_Item_Class rowClass = zqvRowClass("1line", _textCb, _contentCb, _deleteCb);
+  static Elm_Genlist_Item_Class rowClass = zqvRowClass("1line", _textCb, _contentCb);
   return &rowClass;
 }
 
@@ -50,10 +50,6 @@ Evas_Object* WGenlistItemMonoline1Check::_contentCb(void* data, Evas_Object* lis
     elm_object_part_content_set(layout, kContent, row->_createCheck(layout));
   }
   return layout;
-}
-
-void WGenlistItemMonoline1Check::_deleteCb(void* data, Evas_Object*) {
-  delete static_cast<app_assist::WGenlistItem*>(data);
 }
 
 Evas_Object* WGenlistItemMonoline1Check::_createCheck(Evas_Object* parent) {

@@ -2,6 +2,7 @@
 
 #include <efl_assist.h>
 
+#include "ZQVContacts.h"
 #include "ZQVPictureGate.h"
 #include "ZQVRows.h"
 
@@ -47,7 +48,7 @@ WGenlistItemMonoline1Icon::WGenlistItemMonoline1Icon(const char* text, const cha
 WGenlistItemMonoline1Icon::~WGenlistItemMonoline1Icon() = default;
 
 Elm_Genlist_Item_Class* WGenlistItemMonoline1Icon::getItemClass() {
-  static Elm_Genlist_Item_Class rowClass = zqvRowClass("1line", _textCb, _contentCb, _deleteCb);
+  static Elm_Genlist_Item_Class rowClass = zqvRowClass("1line", _textCb, _contentCb);
   return &rowClass;
 }
 
@@ -72,10 +73,6 @@ Evas_Object* WGenlistItemMonoline1Icon::_contentCb(void* data, Evas_Object* list
   elm_object_part_content_set(layout, "elm.swallow.content",
                               zqvRowOf<WGenlistItemMonoline1Icon>(data)->_createImage(layout));
   return layout;
-}
-
-void WGenlistItemMonoline1Icon::_deleteCb(void* data, Evas_Object*) {
-  delete static_cast<app_assist::WGenlistItem*>(data);
 }
 
 Evas_Object* WGenlistItemMonoline1Icon::_createImage(Evas_Object* parent) const {

@@ -3,8 +3,6 @@
 #include "ZQVLog.h"
 #include "ZQVOwned.h"
 
-using OwnedAnswer = ZQVOwned<char, free>;
-
 ZQVAccountCheck::~ZQVAccountCheck() {
   _close();
 }
@@ -31,8 +29,8 @@ ZQVAccountCheck::Result ZQVAccountCheck::_checkOvuStatus() {
 }
 
 bool ZQVAccountCheck::_isOvuAccountExists() {
-  OwnedAnswer imsi;
-  OwnedAnswer msisdn;
+  ZQVPlatformText imsi;
+  ZQVPlatformText msisdn;
   int error = ovu_check_account_exist(_handle, imsi.out(), msisdn.out());
   if (error) {
     ZQV_ERROR("ovu_exist_account_failed [%d]", error);
@@ -45,7 +43,7 @@ bool ZQVAccountCheck::_isOvuAccountExists() {
 }
 
 void ZQVAccountCheck::_checkOvuServiceStatus() {
-  OwnedAnswer status;
+  ZQVPlatformText status;
   const int error = ovu_get_service_status(_handle, OVU_SERVICE_SHARE, status.out(), 1);
   if (error) {
     ZQV_ERROR("ovu_get_service_status failed [%d]", error);

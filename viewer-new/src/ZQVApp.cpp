@@ -29,27 +29,14 @@ using app_assist::WWindowController;
 
 namespace {
 
-constexpr int kEntrySent = 3;
-constexpr int kEntryReceived = 4;
-
 /// What makes the pages show their texts anew.
 constexpr int kTextsChanged = SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE;
 constexpr system_settings_key_e kWatchedSettings[] = {SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR,
                                                       SYSTEM_SETTINGS_KEY_TIME_CHANGED,
                                                       SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE};
 
-using PlatformText = ZQVOwned<char, free>;
-
-std::string edjePath() {
-  const PlatformText resources(app_get_resource_path());
-  char path[513] = {};
-  g_snprintf(path, sizeof path, "%s%s", resources ? resources.get() : "",
-             "/edje/remote_share_viewer.edj");
-  return path;
-}
-
 std::string sharedResource(const char* name) {
-  const PlatformText shared(app_get_shared_resource_path());
+  const ZQVPlatformText shared(app_get_shared_resource_path());
   char path[512] = {};
   g_snprintf(path, sizeof path, "%s%s", shared ? shared.get() : "", name);
   return path;
@@ -59,7 +46,7 @@ std::string sharedResource(const char* name) {
 std::vector<ZQVOwnedText> sentPaths(zelqo_share_h handle, unsigned int count) {
   std::vector<ZQVOwnedText> paths(count);
   for (unsigned int i = 0; i < count; ++i) {
-    PlatformText path;
+    ZQVPlatformText path;
     const int result = zelqo_upload_info_get_content_file_path(handle, i, path.out());
     if (result != ZELQO_ERROR_NONE) {
       ZQV_ERROR("Unexpected SAPI error(get SAPI file path failed)!");
@@ -154,7 +141,7 @@ void ZQVApp::_loadTables() {
 void ZQVApp::_loadTheme() {
   _theme = elm_theme_new();
   elm_theme_ref_set(_theme, nullptr);
-  elm_theme_extension_add(_theme, edjePath().c_str());
+  elm_theme_extension_add(_theme, zqvThemeFile().c_str());
 }
 
 void ZQVApp::onTerminate() {
@@ -170,7 +157,7 @@ void ZQVApp::onTerminate() {
   _colorTable = nullptr;
   _fontTable = nullptr;
   if (_theme) {
-    elm_theme_extension_del(_theme, edjePath().c_str());
+    elm_theme_extension_del(_theme, zqvThemeFile().c_str());
     elm_theme_free(_theme);
     _theme = nullptr;
   }
@@ -214,13 +201,13 @@ void ZQVApp::_launchByViewType(const ZQVLaunchRequest& launch) {
   _requestId = launch.requestId();
   if (strcmp(launch.viewType(), "sent") == 0) {
     if (_thumbList) _clearList();
-    ZQVOrlantLog::getInstance().insertEntryPath(_request, kEntrySent);
+    ZQVOrlantLog::getInstance().insertEntryPath(_request, ZQV_ENTRY_SENT);
     _launchSenderViewSentData();
   } else if (strcmp(launch.viewType(), "received") == 0) {
     if (_thumbList) _clearList();
     _forgetRecipients();
     _contentsToken = launch.contentsToken() ? launch.contentsToken() : "";
-    ZQVOrlantLog::getInstance().insertEntryPath(_request, kEntryReceived);
+    ZQVOrlantLog::getInstance().insertEntryPath(_request, ZQV_ENTRY_RECEIVED);
     _launchReceiverViewBySharedData(_naviframe());
   } else {
     ZQV_ERROR("viewType error");
@@ -232,7 +219,7 @@ void ZQVApp::_launchByContentsToken(const ZQVLaunchRequest& launch) {
   _forgetRecipients();
   _contentsToken = launch.contentsToken();
   _launchReceiverViewBySharedData(_naviframe());
-  ZQVOrlantLog::getInstance().insertEntryPath(_request, kEntryReceived);
+  ZQVOrlantLog::getInstance().insertEntryPath(_request, ZQV_ENTRY_RECEIVED);
 }
 
 void ZQVApp::_launchByFiles(const ZQVLaunchRequest& launch) {
@@ -243,7 +230,7 @@ void ZQVApp::_launchByFiles(const ZQVLaunchRequest& launch) {
   const std::vector<const char*> paths = textsOf(files);
   _initListByAppControl(paths.data(), static_cast<int>(paths.size()));
   _naviframe()->push(new ZQVSenderView(_thumbList, false, true, 0, nullptr, 1, nullptr));
-  ZQVOrlantLog::getInstance().insertEntryPath(_request, kEntrySent);
+  ZQVOrlantLog::getInstance().insertEntryPath(_request, ZQV_ENTRY_SENT);
 }
 
 void ZQVApp::_launchReceiverViewBySharedData(WNaviframeController* naviframe) {

@@ -25,19 +25,17 @@ namespace {
 /// A file type's number is its position here; callers read ranges of it, and the first entry that
 /// begins with the extension is taken. So the order matters.
 constexpr const char* kExtensions[] = {
-    "mpeg", "mpg",   "mp4",  "m4v",    "3gp",  "3gpp", "3g2",  "3gpp2", "mkv",  "webm", "ts",
-    "avi",  "ram",   "rm",   "rmvb",   "wmv",  "asf",  "divx", "flv",   "tp",   "trp",  "m2ts",
-    "mts",  "m2t",   "smi",  "mp3",    "mpga", "m4a",  "wav",  "amr",   "awb",  "3ga",  "wma",
-    "qcp",  "evc",   "pva",  "aac",    "pyv",  "dm",   "ogg",  "oga",   "mka",  "mid",  "midi",
-    "xmf",  "rtttl", "smf",  "imy",    "rtx",  "ota",  "mxmf", "m3u",   "pls",  "wpl",  "m3u8",
-    "fl",   "flac",  "jpeg", "jpg",    "png",  "bmp",  "gif",  "agif",  "webp", "wbmp", "ppt",
-    "pptx", "doc",   "docx", "xls",    "xlsx", "hwp",  "gul",  "pdf",   "txt",  "html", "htm",
-    "vcf",  "vcs",   "vts",  "invalid"};
+    "mpeg", "mpg", "mp4",  "m4v",  "3gp",  "3gpp", "3g2",  "3gpp2", "mkv",  "webm",  "ts",   "avi",
+    "ram",  "rm",  "rmvb", "wmv",  "asf",  "divx", "flv",  "tp",    "trp",  "m2ts",  "mts",  "m2t",
+    "smi",  "mp3", "mpga", "m4a",  "wav",  "amr",  "awb",  "3ga",   "wma",  "qcp",   "evc",  "pva",
+    "aac",  "pyv", "dm",   "ogg",  "oga",  "mka",  "mid",  "midi",  "xmf",  "rtttl", "smf",  "imy",
+    "rtx",  "ota", "mxmf", "m3u",  "pls",  "wpl",  "m3u8", "fl",    "flac", "jpeg",  "jpg",  "png",
+    "bmp",  "gif", "agif", "webp", "wbmp", "ppt",  "pptx", "doc",   "docx", "xls",   "xlsx", "hwp",
+    "gul",  "pdf", "txt",  "html", "htm",  "vcf",  "vcs",  "vts"};
 constexpr int kUnknownType = 80;
-static_assert(sizeof kExtensions / sizeof *kExtensions == kUnknownType + 1);
+static_assert(G_N_ELEMENTS(kExtensions) == kUnknownType);
 
 constexpr size_t kTextBuffer = 513;
-constexpr int kTapDistance = 30;
 
 constexpr const char* kContactsPicker = "contacts-tabui-efl";
 constexpr const char* kUnableToLaunch =
@@ -102,17 +100,12 @@ void brighten(Evas_Object* obj) {
   setColor(obj, r * 2, g * 2, b * 2, a);
 }
 
-void setMoving(Evas_Object* obj, int moving) {
-  evas_object_data_set(obj, "bMoving", GINT_TO_POINTER(moving));
-}
-
 void _btnDelCb(void* data, Evas*, Evas_Object* obj, void*) {
   if (!data) {
     ZQV_ERROR("Invalid argument: data is NULL");
     return;
   }
-  evas_object_data_del(obj, "point_down");
-  evas_object_data_del(obj, "bMoving");
+  ZQVPressPoint::forget(obj);
   delete static_cast<ZQVPressPoint*>(data);
 }
 
@@ -134,11 +127,19 @@ bool fillReshareRequest(app_control_h request, const char* fileUrl, bool single)
 void reshareReplyCb(app_control_h, app_control_h reply, app_control_result_e result, void*) {
   if (result == APP_CONTROL_RESULT_SUCCEEDED) return;
   // The picker tells the user itself what went wrong; its words are fetched and dropped.
-  ZQVOwned<char, free> message;
+  ZQVPlatformText message;
   app_control_get_extra_data(reply, "errorMessage", message.out());
 }
 
 }  // namespace
+
+std::string zqvThemeFile() {
+  const ZQVPlatformText resources(app_get_resource_path());
+  char path[kTextBuffer] = {};
+  g_snprintf(path, sizeof path, "%s%s", resources ? resources.get() : "",
+             "/edje/remote_share_viewer.edj");
+  return path;
+}
 
 ZQViewerCommon::~ZQViewerCommon() = default;
 
@@ -159,14 +160,11 @@ int ZQViewerCommon::getFileTypeNum(const char* fileInfo, char** matchedExt, int 
   g_strlcpy(extension, dot ? dot + 1 : fileInfo, sizeof extension);
   const size_t length = strlen(extension);
   if (length == 0) return kUnknownType;
-  int number = 0;
-  while (strncmp(kExtensions[number], "invalid", 7) != 0) {
-    if (g_ascii_strncasecmp(extension, kExtensions[number], length) == 0) {
-      // Only a caller that already holds a text wants another one.
-      if (matchedExt && *matchedExt) *matchedExt = g_strdup(kExtensions[number]);
-      return number;
-    }
-    ++number;
+  for (int number = 0; number < kUnknownType; ++number) {
+    if (g_ascii_strncasecmp(extension, kExtensions[number], length) != 0) continue;
+    // Only a caller that already holds a text wants another one.
+    if (matchedExt && *matchedExt) *matchedExt = g_strdup(kExtensions[number]);
+    return number;
   }
   return kUnknownType;
 }
@@ -209,7 +207,7 @@ char* ZQViewerCommon::getDateString(const char* locale, const UChar* skeleton, d
 }
 
 char* ZQViewerCommon::makeThemeMarkup(const char* text, const char* textClass, const char* align) {
-  ZQVOwned<char, free> font;
+  ZQVPlatformText font;
   int size = 0;
   int r = 0, g = 0, b = 0, a = 0;
   ea_theme_font_get(textClass, font.out(), &size);
@@ -239,12 +237,8 @@ Evas_Object* ZQViewerCommon::createLayout(Evas_Object* parent, const char* group
     ZQV_ERROR("!parent");
     return nullptr;
   }
-  const ZQVOwned<char, free> resources(app_get_resource_path());
-  char file[kTextBuffer] = {};
-  g_snprintf(file, sizeof file, "%s%s", resources ? resources.get() : "",
-             "/edje/remote_share_viewer.edj");
   Evas_Object* layout = elm_layout_add(parent);
-  elm_layout_file_set(layout, file, group);
+  elm_layout_file_set(layout, zqvThemeFile().c_str(), group);
   evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
   evas_object_size_hint_align_set(layout, EVAS_HINT_FILL, EVAS_HINT_FILL);
   evas_object_show(layout);
@@ -308,7 +302,7 @@ void ZQViewerCommon::setClickable(Evas_Object* obj, void* data, Evas_Object_Even
                                   Evas_Object_Event_Cb downCb, Evas_Object_Event_Cb moveCb) {
   if (!obj) return;
   auto* press = new ZQVPressPoint{};
-  evas_object_data_set(obj, "point_down", press);
+  ZQVPressPoint::set(obj, press);
   evas_object_event_callback_add(obj, EVAS_CALLBACK_MOUSE_DOWN, downCb ? downCb : clickableSelectCb,
                                  data);
   evas_object_event_callback_add(obj, EVAS_CALLBACK_MOUSE_UP, upCb ? upCb : clickableReleaseCb,
@@ -319,7 +313,7 @@ void ZQViewerCommon::setClickable(Evas_Object* obj, void* data, Evas_Object_Even
 }
 
 bool ZQViewerCommon::isMoving(Evas_Object* obj) {
-  return evas_object_data_get(obj, "bMoving") != nullptr;
+  return ZQVPressPoint::isMoving(obj);
 }
 
 void ZQViewerCommon::clickableSelectCb(void*, Evas*, Evas_Object* obj, void* info) {
@@ -332,7 +326,7 @@ void ZQViewerCommon::clickableSelectCb(void*, Evas*, Evas_Object* obj, void* inf
     const auto* event = static_cast<Evas_Event_Mouse_Down*>(info);
     *press = {event->canvas.x, event->canvas.y};
   }
-  setMoving(obj, 0);
+  ZQVPressPoint::setMoving(obj, false);
 }
 
 void ZQViewerCommon::clickableMouseMove_cb(void*, Evas*, Evas_Object* obj, void* info) {
@@ -344,8 +338,8 @@ void ZQViewerCommon::clickableMouseMove_cb(void*, Evas*, Evas_Object* obj, void*
   const ZQVPressPoint* press = ZQVPressPoint::of(obj);
   // A touch screen reports no moves without a finger on it; a mouse does.
   if (!press || !event->buttons) return;
-  if (!press->isFurtherThan(kTapDistance, event->cur.canvas)) return;
-  setMoving(obj, 1);
+  if (!press->isFurtherThan(ZQVPressPoint::kTapDistance, event->cur.canvas)) return;
+  ZQVPressPoint::setMoving(obj, true);
   brighten(obj);
 }
 
@@ -353,5 +347,5 @@ void ZQViewerCommon::clickableMouseMove_cb(void*, Evas*, Evas_Object* obj, void*
 /// always looked, the object flashes when the finger lets go.
 void ZQViewerCommon::clickableReleaseCb(void*, Evas*, Evas_Object* obj, void*) {
   brighten(obj);
-  setMoving(obj, 0);
+  ZQVPressPoint::setMoving(obj, false);
 }

@@ -2,14 +2,10 @@
 
 #include <contacts.h>
 
-#include "ZQVCommon.h"
 #include "ZQVLog.h"
 #include "ZQVOwned.h"
 
 namespace {
-
-constexpr const char* kGroupImage = ZQV_IMAGE_DIR "zq_caller_id_default_group.png";
-constexpr const char* kPersonImage = ZQV_IMAGE_DIR "contacts_caller_id_default_02.png";
 
 using Filter = ZQVOwned<std::remove_pointer_t<contacts_filter_h>, contacts_filter_destroy>;
 using Query = ZQVOwned<std::remove_pointer_t<contacts_query_h>, contacts_query_destroy>;
@@ -98,8 +94,8 @@ std::string ZQVContacts::recipientsText(zelqo_recipient_s** recipients, uint32_t
 }
 
 std::string ZQVContacts::recipientsImage(zelqo_recipient_s** recipients, uint32_t count) {
-  if (count > 1) return kGroupImage;
+  if (count > 1) return ZQV_GROUP_CALLER_IMAGE;
   const bool any = recipients && count == 1 && recipients[0];
   const std::string image = any ? _getContactImagePath(recipients[0]->msisdn) : std::string();
-  return image.empty() ? kPersonImage : image;
+  return image.empty() ? ZQV_DEFAULT_CALLER_IMAGE : image;
 }

@@ -49,7 +49,7 @@ std::vector<const char*> listExtensions(const std::vector<ZQViewerThumbnailItem*
 
 void downloadReplyCb(app_control_h, app_control_h reply, app_control_result_e result, void*) {
   if (result == APP_CONTROL_RESULT_SUCCEEDED) return;
-  ZQVOwned<char, free> message;
+  ZQVPlatformText message;
   app_control_get_extra_data(reply, "errorMessage", message.out());
 }
 

@@ -44,7 +44,7 @@ std::string namedPath(const ZQViewerThumbnailItem& item) {
 }
 
 bool isMarkedDownloaded(const char* url) {
-  ZQVOwned<char, free> value;
+  ZQVPlatformText value;
   return preference_get_string(url, value.out()) == PREFERENCE_ERROR_NONE &&
          g_strcmp0(value.get(), url) == 0;
 }
@@ -100,12 +100,16 @@ std::string zqvDownloadedPath(const ZQViewerThumbnailItem& item) {
   return path.empty() ? namedPath(item) : path;
 }
 
+bool zqvIsDownloadedByName(const ZQViewerThumbnailItem& item) {
+  if (!item.downloadUrl) return false;
+  const std::string named = namedPath(item);
+  return !named.empty() && ecore_file_exists(named.c_str()) && isMarkedDownloaded(item.downloadUrl);
+}
+
 bool zqvIsDownloaded(const ZQViewerThumbnailItem& item) {
   if (!item.downloadUrl) return false;
   const std::string recorded = recordedPath(item);
-  if (!recorded.empty()) return ecore_file_exists(recorded.c_str());
-  const std::string named = namedPath(item);
-  return !named.empty() && ecore_file_exists(named.c_str()) && isMarkedDownloaded(item.downloadUrl);
+  return recorded.empty() ? zqvIsDownloadedByName(item) : ecore_file_exists(recorded.c_str());
 }
 
 bool zqvMayBeOpened(const char* path) {

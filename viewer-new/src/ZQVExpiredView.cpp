@@ -10,6 +10,7 @@
 #include "ZQVLog.h"
 #include "ZQVMarkup.h"
 #include "ZQVOwned.h"
+#include "ZQVSizeText.h"
 #include "ZQVText.h"
 #include "ZQVWindow.h"
 
@@ -51,8 +52,7 @@ Evas_Object* ZQVExpiredView::onCreateView(Evas_Object* parent, void*) {
   }
   setTitle(_titleText().c_str());
   Evas_Object* scroller = elm_scroller_add(parent);
-  edje_object_color_class_set(elm_layout_edje_get(scroller), "transparent", 229, 237, 240, 255, 0,
-                              0, 0, 0, 0, 0, 0, 0);
+  zqvColorPage(scroller);
   Evas_Object* layout = ZQViewerCommon::getInstance().createLayout(
       scroller, "expired_viewer_shared_file_thumbnail_layout");
   _textLabel = createLabel(layout, "elm.swallow.label.text");
@@ -108,15 +108,7 @@ void ZQVExpiredView::update(int event) {
 }
 
 char* ZQVExpiredView::getSummaryText() const {
-  float value = 0;
-  const ZQVOwnedText unit(
-      ZQViewerCommon::getInstance().zquiCommonConvertFileSizeUnit(_totalSize, &value));
-  char number[10] = {};
-  g_snprintf(number, sizeof number, "%.2f", static_cast<double>(value));
-  const std::string files =
-      _fileCount == 1 ? zqvFormat("IDS_RSH_SBODY_1_FILE_HP1SS_P2SS_ABB", "ss", number, unit.get())
-                      : zqvFormat("IDS_RSH_SBODY_P1SD_FILES_HP2SS_P3SS_ABB", "dss", _fileCount,
-                                  number, unit.get());
+  const std::string files = zqvFilesAndSize(_fileCount, _totalSize);
   const std::string day = zqvFormat("IDS_RSH_BODY_EXPIRED_ON_PS", "s", _dateText().c_str());
   char text[1025] = {};
   g_snprintf(text, sizeof text, "%s<br>%s", files.c_str(), day.c_str());

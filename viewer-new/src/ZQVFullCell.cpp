@@ -7,6 +7,7 @@
 #include "ZQVCellParts.h"
 #include "ZQVCommon.h"
 #include "ZQVIcons.h"
+#include "ZQVItemGrid.h"
 #include "ZQVLog.h"
 #include "ZQVMarkup.h"
 #include "ZQVOwned.h"
@@ -28,7 +29,7 @@ bool hasPicture(const char* mimeType) {
 }
 
 bool isDimmed(const ZQViewerThumbnailItem* item, Evas_Object* grid) {
-  if (GPOINTER_TO_INT(evas_object_data_get(grid, "ViewType")) != ZQV_VIEW_FULL_SENDER) return false;
+  if (ZQVItemGrid::viewTypeOf(grid) != ZQV_VIEW_FULL_SENDER) return false;
   return !item->thumbPath || !ecore_file_exists(item->thumbPath) ||
          strcmp(item->thumbPath, ZQV_LARGE_IMG_ICON) == 0;
 }

@@ -15,6 +15,7 @@
 #include "ZQVOrlantLog.h"
 #include "ZQVOwned.h"
 #include "ZQVPager.h"
+#include "ZQVPictureButton.h"
 #include "ZQVStatusMessage.h"
 #include "ZQVText.h"
 #include "ZQVUnableOpenFilePopup.h"
@@ -26,11 +27,9 @@ namespace {
 constexpr const char* kOpen = "IDS_RSH_BUTTON_OPEN";
 constexpr const char* kDownload = "IDS_RSH_BUTTON_DOWNLOAD_ABB3";
 constexpr const char* kServiceFolder = "/opt/usr/apps/com.orlant.zelqo/shared/data/";
-constexpr const char* kBoundButton = "bindedObject";
-constexpr const char* kBoundData = "bindedObjectClickedCbData";
 /// Long enough for the layout to settle after the pager got a new size.
 constexpr double kSettleTime = 0.1;
-/// Upstream's way to say "as many as you like".
+/// The toolkit's way to say "as many as you like".
 constexpr int kNoPageLimit = 9999;
 constexpr const char* kArrows[] = {"Left", "Right"};
 
@@ -73,8 +72,8 @@ ZQVFullView::~ZQVFullView() {
   evas_object_smart_callback_del_full(_grid.get(), "scroll", _scrollCb, this);
   evas_object_event_callback_del_full(_grid.get(), EVAS_CALLBACK_RESIZE, _resizedCb, this);
   evas_object_data_del(_grid.get(), ZQVFullCell::kOpening);
-  evas_object_data_del(_grid.get(), kBoundData);
-  evas_object_data_del(_grid.get(), kBoundButton);
+  evas_object_data_del(_grid.get(), ZQVPictureButton::kBoundData);
+  evas_object_data_del(_grid.get(), ZQVPictureButton::kBoundButton);
 }
 
 const char* ZQVFullView::getClassName() {
@@ -129,8 +128,8 @@ void ZQVFullView::onPushed(Elm_Object_Item* item) {
   elm_object_style_set(_toolButton, "bottom");
   evas_object_smart_callback_add(_toolButton, "clicked", fullViewerToolBtnCb, this);
   elm_object_item_part_content_set(item, "toolbar", _toolButton);
-  evas_object_data_set(_grid.get(), kBoundData, this);
-  evas_object_data_set(_grid.get(), kBoundButton, _toolButton.get());
+  evas_object_data_set(_grid.get(), ZQVPictureButton::kBoundData, this);
+  evas_object_data_set(_grid.get(), ZQVPictureButton::kBoundButton, _toolButton.get());
   _rotation.connect(zqvWindowOf(*this), "rotation,changed", _rotateCb, this);
   _takeKeys(zqvWindowOf(*this));
   if (_isSentShare()) {
@@ -278,8 +277,7 @@ void ZQVFullView::_setUpPager() {
   elm_scroller_single_direction_set(pager, ELM_SCROLLER_SINGLE_DIRECTION_HARD);
   evas_object_smart_callback_add(pager, "scroll", _scrollCb, this);
   evas_object_event_callback_add(pager, EVAS_CALLBACK_RESIZE, _resizedCb, this);
-  edje_object_color_class_set(elm_layout_edje_get(pager), "transparent", 229, 237, 240, 255, 0, 0,
-                              0, 0, 0, 0, 0, 0);
+  zqvColorPage(pager);
   evas_object_show(pager);
 }
 

@@ -1,5 +1,7 @@
 #include "ZQVItemGrid.h"
 
+#include <glib.h>
+
 #include "ZQVAccess.h"
 #include "ZQVGridMetrics.h"
 
@@ -30,12 +32,13 @@ Evas_Object* ZQVItemGrid::createVertical(Evas_Object* parent, const char* style)
 
 Evas_Object* ZQVItemGrid::create(Evas_Object* parent) {
   _grid = elm_gengrid_add(parent);
-  evas_object_data_set(_grid, kViewType, reinterpret_cast<void*>(static_cast<intptr_t>(_viewType)));
+  evas_object_data_set(_grid, kViewType, GINT_TO_POINTER(_viewType));
   evas_object_event_callback_add(_grid, EVAS_CALLBACK_DEL, _deletedCb, this);
   return _grid;
 }
 
 void ZQVItemGrid::fitCells(Evas_Object* window) {
+  if (!_grid) return;
   const int side = zqvGridCellSide(window);
   elm_gengrid_item_size_set(_grid, side, side);
 }
@@ -68,6 +71,14 @@ void ZQVItemGrid::forgetCells() {
   EINA_LIST_FOREACH(_items, node, data) {
     if (data) static_cast<ZQViewerThumbnailItem*>(data)->gridItems[_viewType] = nullptr;
   }
+}
+
+int ZQVItemGrid::viewTypeOf(Evas_Object* grid) {
+  return GPOINTER_TO_INT(grid ? evas_object_data_get(grid, kViewType) : nullptr);
+}
+
+void ZQVItemGrid::resetViewType(Evas_Object* grid) {
+  evas_object_data_set(grid, kViewType, nullptr);
 }
 
 void ZQVItemGrid::_deletedCb(void* data, Evas*, Evas_Object*, void*) {

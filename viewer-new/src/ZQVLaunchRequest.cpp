@@ -19,7 +19,7 @@ ZQVLaunchRequest::ZQVLaunchRequest(app_control_h request)
       _requestId(_extra("request_id")) {}
 
 bool ZQVLaunchRequest::isForViewer(app_control_h request) {
-  Text operation;
+  ZQVPlatformText operation;
   if (app_control_get_operation(request, operation.out()) != APP_CONTROL_ERROR_NONE || !operation) {
     ZQV_ERROR("Invalid operation: %s", "operation is NULL");
     return false;
@@ -39,8 +39,8 @@ int32_t ZQVLaunchRequest::requestId() const {
   return _requestId ? static_cast<int32_t>(strtol(_requestId.get(), nullptr, 10)) : 0;
 }
 
-std::vector<ZQVLaunchRequest::Text> ZQVLaunchRequest::files() const {
-  std::vector<Text> files;
+std::vector<ZQVPlatformText> ZQVLaunchRequest::files() const {
+  std::vector<ZQVPlatformText> files;
   ZQVOwned<char*, free> paths;
   int length = 0;
   if (app_control_get_extra_data_array(_request, "freemsg_send_data", paths.out(), &length) !=
@@ -51,8 +51,8 @@ std::vector<ZQVLaunchRequest::Text> ZQVLaunchRequest::files() const {
   return files;
 }
 
-ZQVLaunchRequest::Text ZQVLaunchRequest::_extra(const char* key) const {
-  Text value;
+ZQVPlatformText ZQVLaunchRequest::_extra(const char* key) const {
+  ZQVPlatformText value;
   if (app_control_get_extra_data(_request, key, value.out()) != APP_CONTROL_ERROR_NONE) {
     value.reset();
   }

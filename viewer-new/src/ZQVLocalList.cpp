@@ -15,7 +15,6 @@
 namespace {
 
 using Filter = ZQVOwned<std::remove_pointer_t<filter_h>, media_filter_destroy>;
-using PlatformText = ZQVOwned<char, free>;
 using MediaList = std::vector<ZQVLocalList::Media>;
 
 constexpr size_t kNameBuffer = 512;
@@ -54,15 +53,15 @@ bool keepMediaCb(media_info_h media, void* data) {
 }
 
 char* mimeTypeOf(const char* extension) {
-  PlatformText type;
+  ZQVPlatformText type;
   mime_type_get_mime_type(extension, type.out());
   const bool known = type && strcmp(type.get(), "application/octet-stream") != 0;
   return g_strdup(known ? type.get() : "unknown");
 }
 
 /// The media database's small picture of a file; null when there is none.
-PlatformText mediaThumbnailOf(const char* path) {
-  PlatformText thumbnail;
+ZQVPlatformText mediaThumbnailOf(const char* path) {
+  ZQVPlatformText thumbnail;
   ZQVLocalList::Media media;
   if (ZQVLocalList::_mediaInfoCreateByPath(path, &media) != 0) {
     ZQV_ERROR("_mediaInfoCreateByPath is failed");
@@ -126,7 +125,7 @@ std::unique_ptr<ZQViewerThumbnailItem> ZQVLocalList::_createItem(const char* pat
 }
 
 void ZQVLocalList::_getThumbnailByFilePath(const char* path, ZQViewerThumbnailItem* item) {
-  const PlatformText thumbnail = mediaThumbnailOf(path);
+  const ZQVPlatformText thumbnail = mediaThumbnailOf(path);
   const bool exists = ecore_file_exists(path);
   item->noThumbnail = !exists;
   if (zqvContains(item->mimeType, "image/")) {

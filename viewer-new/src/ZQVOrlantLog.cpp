@@ -13,7 +13,6 @@ namespace {
 constexpr const char* kAppId = "com.orlant.zelqo";
 constexpr const char* kFeatureUri = "content://com.orlant.usagelog/log/use_app_feature_survey";
 
-constexpr int kEntrySent = 3;
 constexpr uint32_t k100MB = 104857600;
 constexpr uint32_t k500MB = 524288000;
 constexpr uint32_t k1GB = 1073741824;
@@ -32,7 +31,8 @@ constexpr std::array<EntryPath, 3> kEntryPaths{{
 
 const char* entryPathOf(const char* caller, int entry) {
   for (const EntryPath& path : kEntryPaths) {
-    if (g_strcmp0(caller, path.caller) == 0) return entry == kEntrySent ? path.sent : path.received;
+    if (g_strcmp0(caller, path.caller) == 0)
+      return entry == ZQV_ENTRY_SENT ? path.sent : path.received;
   }
   return "Push_notification";
 }
@@ -95,7 +95,7 @@ void ZQVOrlantLog::insertEntryPath(app_control_h request, int entry) {
     ZQV_ERROR("request is NULL");
     return;
   }
-  ZQVOwned<char, free> caller;
+  ZQVPlatformText caller;
   app_control_get_caller(request, caller.out());
   _insert("ZQ50", entryPathOf(caller.get(), entry));
 }

@@ -15,7 +15,6 @@ const char* const ZQVPictureButton::kVideoIcon =
 
 namespace {
 
-constexpr int kTapDistance = 30;
 constexpr int kLeaveDistance = 100;
 constexpr double kPressedSize = 0.7;
 
@@ -33,8 +32,9 @@ bool hasArguments(void* data, void* info) {
 
 /// The button that the grid is bound to, if it opens the file now.
 Evas_Object* openButtonOf(Evas_Object* grid) {
-  auto* button = static_cast<Evas_Object*>(evas_object_data_get(grid, "bindedObject"));
-  if (!button || !evas_object_data_get(grid, "bindedObjectClickedCbData")) return nullptr;
+  auto* button =
+      static_cast<Evas_Object*>(evas_object_data_get(grid, ZQVPictureButton::kBoundButton));
+  if (!button || !evas_object_data_get(grid, ZQVPictureButton::kBoundData)) return nullptr;
   const bool opens = g_strcmp0(elm_object_text_get(button), zqvText("IDS_RSH_BUTTON_OPEN")) == 0;
   return opens ? button : nullptr;
 }
@@ -73,14 +73,10 @@ void restoreSize(Evas_Object* obj) {
   setSize(obj, dataOf(obj, "width"), dataOf(obj, "height"));
 }
 
-void setMoving(Evas_Object* obj, int moving) {
-  evas_object_data_set(obj, "bMoving", GINT_TO_POINTER(moving));
-}
-
 void pressVideoIcon(Evas_Object* obj, const Evas_Event_Mouse_Down* event) {
   ZQV_TRACE("Video icon was mouse down!");
   if (ZQVPressPoint* press = ZQVPressPoint::of(obj)) *press = {event->canvas.x, event->canvas.y};
-  setMoving(obj, 0);
+  ZQVPressPoint::setMoving(obj, false);
   rememberSize(obj);
   setSize(obj, static_cast<int>(dataOf(obj, "width") * kPressedSize),
           static_cast<int>(dataOf(obj, "height") * kPressedSize));
@@ -90,8 +86,8 @@ void pressVideoIcon(Evas_Object* obj, const Evas_Event_Mouse_Down* event) {
 void moveOnVideoIcon(Evas_Object* obj, const Evas_Event_Mouse_Move* event) {
   ZQV_TRACE("Video icon was mouse down!");
   const ZQVPressPoint* press = ZQVPressPoint::of(obj);
-  if (!press || !press->isFurtherThan(kTapDistance, event->cur.canvas)) return;
-  setMoving(obj, 1);
+  if (!press || !press->isFurtherThan(ZQVPressPoint::kTapDistance, event->cur.canvas)) return;
+  ZQVPressPoint::setMoving(obj, true);
   if (!press->isFurtherThan(kLeaveDistance, event->cur.canvas)) return;
   restoreSize(obj);
   ea_theme_object_color_set(obj, "W025");
@@ -99,7 +95,7 @@ void moveOnVideoIcon(Evas_Object* obj, const Evas_Event_Mouse_Move* event) {
 
 void releaseVideoIcon(Evas_Object* obj) {
   ZQV_TRACE("Video icon was mouse up!");
-  setMoving(obj, 0);
+  ZQVPressPoint::setMoving(obj, false);
   restoreSize(obj);
   ea_theme_object_color_set(obj, "W025");
 }
@@ -133,9 +129,8 @@ void ZQVPictureButton::_mouseUpCb(void* data, Evas* canvas, Evas_Object* obj, vo
   if (!button) return;
   // Whatever the button does may take the cell away.
   const ZQVWeakObject pressed(obj);
-  if (!ZQViewerCommon::getInstance().isMoving(obj)) {
-    evas_object_smart_callback_call(button, "clicked",
-                                    evas_object_data_get(grid, "bindedObjectClickedCbData"));
+  if (!ZQVPressPoint::isMoving(obj)) {
+    evas_object_smart_callback_call(button, "clicked", evas_object_data_get(grid, kBoundData));
   }
   if (!pressed.get()) return;
   if (isVideoIcon(obj)) {

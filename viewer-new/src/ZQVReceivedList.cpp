@@ -9,12 +9,11 @@
 
 namespace {
 
-using ServiceText = ZQVOwned<char, free>;
 using TextGetter = int (*)(zelqo_share_h, unsigned int, char**);
 
 /// Null when the service has no such text.
 char* textOf(TextGetter get, zelqo_share_h share, uint32_t number) {
-  ServiceText text;
+  ZQVPlatformText text;
   const int result = get(share, number, text.out());
   return result == ZELQO_ERROR_NONE ? g_strdup(text.get()) : nullptr;
 }

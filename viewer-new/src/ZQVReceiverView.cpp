@@ -13,6 +13,7 @@
 #include "ZQVMarkup.h"
 #include "ZQVOwned.h"
 #include "ZQVSelectView.h"
+#include "ZQVSizeText.h"
 #include "ZQVStatusMessage.h"
 #include "ZQVText.h"
 #include "ZQVThumbItem.h"
@@ -113,7 +114,7 @@ void ZQVReceiverView::onBecomeTop() {
 }
 
 void ZQVReceiverView::resetViewType(Evas_Object* grid) {
-  evas_object_data_set(grid, "ViewType", nullptr);
+  ZQVItemGrid::resetViewType(grid);
 }
 
 void ZQVReceiverView::setName(const char* name) {
@@ -143,7 +144,8 @@ void ZQVReceiverView::_showSummary() {
 }
 
 char* ZQVReceiverView::getSummaryText() const {
-  std::string text = _sizeLine() + "<br>" + _expiryLine();
+  const int count = static_cast<int>(eina_list_count(_items));
+  std::string text = zqvFilesAndSize(count, _totalSize) + "<br>" + _expiryLine();
   if (_isSingleShare) text += "<br><br>" + _hint();
   return ZQViewerCommon::getInstance().makeThemeMarkup(text.c_str(), "T024", "left");
 }
@@ -157,21 +159,8 @@ void ZQVReceiverView::_nameTitle() {
   zqvSetAccessibleName(getNaviItem(), zqvFormat(kTitle, "s", _senderName.c_str()));
 }
 
-std::string ZQVReceiverView::_sizeLine() const {
-  float value = 0;
-  const ZQVOwnedText unit(
-      ZQViewerCommon::getInstance().zquiCommonConvertFileSizeUnit(_totalSize, &value));
-  char number[10] = {};
-  g_snprintf(number, sizeof number, "%.2f", static_cast<double>(value));
-  const int count = static_cast<int>(eina_list_count(_items));
-  if (count == 1) {
-    return zqvFormat("IDS_RSH_SBODY_1_FILE_HP1SS_P2SS_ABB", "ss", number, unit.get());
-  }
-  return zqvFormat("IDS_RSH_SBODY_P1SD_FILES_HP2SS_P3SS_ABB", "dss", count, number, unit.get());
-}
-
 std::string ZQVReceiverView::_expiryLine() const {
-  const ZQVOwned<char, free> region(vconf_get_str(kRegionFormat));
+  const ZQVPlatformText region(vconf_get_str(kRegionFormat));
   // The first three letters only: the day is shown without the time.
   UChar skeleton[16] = {};
   u_uastrncpy(skeleton, "yMdHm", 3);
@@ -274,7 +263,7 @@ void ZQVReceiverView::_rotateCb(void* data, Evas_Object* window, void*) {
     return;
   }
   auto* view = static_cast<ZQVReceiverView*>(data);
-  if (view->_grid.get()) view->_grid.fitCells(window);
+  view->_grid.fitCells(window);
 }
 
 void ZQVReceiverView::_gridDeletedCb(void* data, Evas*, Evas_Object* grid, void*) {

@@ -11,14 +11,30 @@ extern "C" {
 void elm_genlist_realization_mode_set(Evas_Object* list, Eina_Bool mode);
 }
 
+namespace {
+
+void deleteRowCb(void* data, Evas_Object*) {
+  delete static_cast<app_assist::WGenlistItem*>(data);
+}
+
+}  // namespace
+
 Elm_Genlist_Item_Class zqvRowClass(const char* style, Elm_Gen_Item_Text_Get_Cb text,
-                                   Elm_Gen_Item_Content_Get_Cb content, Elm_Gen_Item_Del_Cb del) {
+                                   Elm_Gen_Item_Content_Get_Cb content) {
   Elm_Genlist_Item_Class rowClass{};
   rowClass.item_style = style;
   rowClass.func.text_get = text;
   rowClass.func.content_get = content;
-  rowClass.func.del = del;
+  rowClass.func.del = deleteRowCb;
   return rowClass;
+}
+
+Evas_Object* zqvCreateRowList(Evas_Object* parent) {
+  Evas_Object* list = elm_genlist_add(parent);
+  elm_genlist_mode_set(list, ELM_LIST_COMPRESS);
+  elm_genlist_realization_mode_set(list, EINA_TRUE);
+  evas_object_show(list);
+  return list;
 }
 
 bool zqvIsOneOf(const char* part, std::initializer_list<const char*> parts) {
@@ -42,8 +58,4 @@ Elm_Object_Item* zqvAppendRow(Evas_Object* list, app_assist::WGenlistItem* row,
     delete row;
   }
   return item;
-}
-
-void zqvRealizeAllRows(Evas_Object* list) {
-  elm_genlist_realization_mode_set(list, EINA_TRUE);
 }

@@ -58,7 +58,8 @@ Evas_Object* ZQVSelectView::onCreateView(Evas_Object* parent, void*) {
   setTitle(kTitle);
   Evas_Object* layout =
       ZQViewerCommon::getInstance().createLayout(parent, "viewer_select_thumbnail_layout");
-  elm_object_part_content_set(layout, "elm.swallow.recipient.text", _createList(layout));
+  _list = zqvCreateRowList(layout);
+  elm_object_part_content_set(layout, "elm.swallow.recipient.text", _list);
   elm_object_part_content_set(layout, "elm.swallow.gengrid.layout",
                               _grid.createVertical(layout, "no_effect"));
   return layout;
@@ -182,15 +183,7 @@ void ZQVSelectView::_rotateCb(void* data, Evas_Object* window, void*) {
     return;
   }
   auto* view = static_cast<ZQVSelectView*>(data);
-  if (view->_grid.get()) view->_grid.fitCells(window);
-}
-
-Evas_Object* ZQVSelectView::_createList(Evas_Object* parent) {
-  _list = elm_genlist_add(parent);
-  elm_genlist_mode_set(_list, ELM_LIST_COMPRESS);
-  zqvRealizeAllRows(_list);
-  evas_object_show(_list);
-  return _list;
+  view->_grid.fitCells(window);
 }
 
 Evas_Object* ZQVSelectView::_createTitleButton(const char* style, const char* text,

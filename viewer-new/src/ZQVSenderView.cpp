@@ -83,13 +83,13 @@ Evas_Object* ZQVSenderView::onCreateView(Evas_Object* parent, void*) {
   setTitle(kTitle);
   if (_isGridOnly) {
     Evas_Object* grid = _grid.createVertical(parent, nullptr);
-    edje_object_color_class_set(elm_layout_edje_get(grid), "transparent", 229, 237, 240, 255, 0, 0,
-                                0, 0, 0, 0, 0, 0);
+    zqvColorPage(grid);
     return grid;
   }
   Evas_Object* layout = ZQViewerCommon::getInstance().createLayout(
       parent, "sender_viewer_shared_file_thumbnail_layout");
-  elm_object_part_content_set(layout, "elm.swallow.recipient.text", _createList(layout));
+  _list = zqvCreateRowList(layout);
+  elm_object_part_content_set(layout, "elm.swallow.recipient.text", _list);
   elm_object_part_content_set(layout, "elm.swallow.gengrid.layout",
                               _grid.createVertical(layout, nullptr));
   return layout;
@@ -189,7 +189,7 @@ void ZQVSenderView::_rotateCb(void* data, Evas_Object* window, void*) {
     return;
   }
   auto* view = static_cast<ZQVSenderView*>(data);
-  if (view->_grid.get()) view->_grid.fitCells(window);
+  view->_grid.fitCells(window);
 }
 
 void ZQVSenderView::_recallBtnCb(void* data, Evas_Object*, void*) {
@@ -253,14 +253,6 @@ int ZQVSenderView::_sendDbusSignalToHistory(ZQVSenderView*, const char* member, 
   g_dbus_connection_flush_sync(bus.get(), nullptr, &error);
   logAndClear(&error);
   return 0;
-}
-
-Evas_Object* ZQVSenderView::_createList(Evas_Object* parent) {
-  _list = elm_genlist_add(parent);
-  elm_genlist_mode_set(_list, ELM_LIST_COMPRESS);
-  zqvRealizeAllRows(_list);
-  evas_object_show(_list);
-  return _list;
 }
 
 Evas_Object* ZQVSenderView::_createToolbarButton(Evas_Object* box, const char* text,

@@ -1,7 +1,5 @@
 #include "ZQVSmallCell.h"
 
-#include <glib.h>
-
 #include <algorithm>
 #include <cstring>
 
@@ -10,6 +8,7 @@
 #include "ZQVFilePages.h"
 #include "ZQVFrames.h"
 #include "ZQVIcons.h"
+#include "ZQVItemGrid.h"
 #include "ZQVLog.h"
 #include "ZQVMarkup.h"
 #include "ZQVOwned.h"
@@ -21,10 +20,6 @@ namespace {
 /// Leaves room for the tags in the markup's buffer.
 constexpr size_t kLongestName = 768;
 constexpr int kPrescale = 32;
-
-int viewTypeOf(Evas_Object* grid) {
-  return GPOINTER_TO_INT(evas_object_data_get(grid, "ViewType"));
-}
 
 Evas_Object* createCheck(const ZQViewerThumbnailItem* item, Evas_Object* grid) {
   Evas_Object* check = elm_check_add(grid);
@@ -84,7 +79,7 @@ void setUpDecoding(Evas_Object* icon, Evas_Object* grid, const char* path) {
 }
 
 void addPicture(const ZQViewerThumbnailItem* item, Evas_Object* grid, Evas_Object* layout) {
-  const bool sender = viewTypeOf(grid) == ZQV_VIEW_SENDER;
+  const bool sender = ZQVItemGrid::viewTypeOf(grid) == ZQV_VIEW_SENDER;
   const std::string path = pictureOf(item);
   const bool isDefault = path == ZQV_SMALL_IMG_ICON;
   const bool dimmed = sender && (isDefault || path != (item->thumbPath ? item->thumbPath : ""));
@@ -129,7 +124,7 @@ Evas_Object* ZQVSmallCell::__getContent(const ZQViewerThumbnailItem* item, Evas_
     ZQV_ERROR("!data || !obj || !part");
     return nullptr;
   }
-  const int viewType = viewTypeOf(grid);
+  const int viewType = ZQVItemGrid::viewTypeOf(grid);
   if (strcmp(part, "elm.swallow.end") == 0) {
     return viewType == ZQV_VIEW_SELECT ? createCheck(item, grid) : nullptr;
   }

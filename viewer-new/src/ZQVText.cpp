@@ -51,6 +51,6 @@ std::string zqvFormat(const char* id, const char* arguments, ...) {
 
 std::string zqvEscape(const char* text) {
   if (!text) return {};
-  ZQVOwned<char, free> markup(evas_textblock_text_utf8_to_markup(nullptr, text));
+  ZQVPlatformText markup(evas_textblock_text_utf8_to_markup(nullptr, text));
   return markup ? markup.get() : "";
 }

@@ -3,6 +3,7 @@
 #include <glib.h>
 
 #include "ZQVFullCell.h"
+#include "ZQVItemGrid.h"
 #include "ZQVLog.h"
 #include "ZQVSmallCell.h"
 
@@ -10,7 +11,7 @@ namespace {
 
 Evas_Object* _contentGetCb(void* data, Evas_Object* grid, const char* part) {
   const auto* item = static_cast<ZQViewerThumbnailItem*>(data);
-  switch (GPOINTER_TO_INT(grid ? evas_object_data_get(grid, "ViewType") : nullptr)) {
+  switch (ZQVItemGrid::viewTypeOf(grid)) {
     case ZQV_VIEW_FULL_RECEIVER:
     case ZQV_VIEW_FULL_SENDER:
       return ZQVFullCell::__getFullViewContent(item, grid, part);

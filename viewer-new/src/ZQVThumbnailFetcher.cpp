@@ -11,6 +11,7 @@
 #include "ZQVAccess.h"
 #include "ZQVCellParts.h"
 #include "ZQVCommon.h"
+#include "ZQVDownloadedFile.h"
 #include "ZQVIcons.h"
 #include "ZQVLog.h"
 #include "ZQVSharedFiles.h"
@@ -27,11 +28,9 @@ constexpr double kRefreshDelay = 0.8;
 constexpr int kNormalPriority = 1;
 constexpr size_t kPathBuffer = 512;
 
-using PlatformText = ZQVOwned<char, free>;
-
 /// Null when nothing is stored under the key.
-PlatformText preferenceOf(const char* key) {
-  PlatformText value;
+ZQVPlatformText preferenceOf(const char* key) {
+  ZQVPlatformText value;
   if (preference_get_string(key, value.out()) != PREFERENCE_ERROR_NONE) value.reset();
   return value;
 }
@@ -41,24 +40,10 @@ void replaceText(char** text, const char* value) {
   *text = g_strdup(value);
 }
 
-/// A sender chooses the name: it must not lead out of the folder.
-bool isPlainName(const char* name) {
-  return name && *name && !strchr(name, '/') && strcmp(name, ".") != 0 && strcmp(name, "..") != 0;
-}
-
-/// Is there a file of this name that was downloaded from this address?
-bool isDownloadedByName(const ZQViewerThumbnailItem* item) {
-  if (!item->downloadUrl || !isPlainName(item->fileName)) return false;
-  char path[kPathBuffer] = {};
-  g_snprintf(path, sizeof path, "%s/%s", ZQV_DOWNLOAD_DIR, item->fileName);
-  if (!ecore_file_exists(path)) return false;
-  return g_strcmp0(preferenceOf(item->downloadUrl).get(), item->downloadUrl) == 0;
-}
-
 bool isDownloaded(const ZQViewerThumbnailItem* item) {
   if (!item->downloadUrl) return false;
   const ZQVOwnedText recorded = ZQVThumbnailFetcher::_getItemFromJson(item->downloadUrl);
-  if (!recorded) return isDownloadedByName(item);
+  if (!recorded) return zqvIsDownloadedByName(*item);
   char path[kPathBuffer] = {};
   g_strlcpy(path, recorded.get(), sizeof path);
   return ecore_file_exists(path);
@@ -126,7 +111,7 @@ void ZQVThumbnailFetcher::_getContentInfoNReqNormalThumbnail(zelqo_share_h handl
 
 void ZQVThumbnailFetcher::_readContentInfo(zelqo_share_h handle, int serviceIndex,
                                            ZQViewerThumbnailItem* item) {
-  PlatformText url;
+  ZQVPlatformText url;
   const int result = zelqo_content_info_get_download_url(
       handle, static_cast<unsigned int>(serviceIndex), url.out());
   replaceText(&item->downloadUrl, result == ZELQO_ERROR_NONE ? url.get() : nullptr);
@@ -140,7 +125,7 @@ void ZQVThumbnailFetcher::_readContentInfo(zelqo_share_h handle, int serviceInde
 
 void ZQVThumbnailFetcher::_reuseThumbnail(ZQViewerThumbnailItem* item, Urls* missing) {
   if (!item->thumbUrl) return;
-  const PlatformText stored = preferenceOf(item->thumbUrl);
+  const ZQVPlatformText stored = preferenceOf(item->thumbUrl);
   if (stored && ecore_file_exists(stored.get())) {
     replaceText(&item->thumbPath, stored.get());
     return;
@@ -159,7 +144,7 @@ void ZQVThumbnailFetcher::_reqMidThumbnail(zelqo_share_h handle) {
   const Eina_List* node = nullptr;
   void* data = nullptr;
   EINA_LIST_FOREACH(_items, node, data) {
-    PlatformText type;
+    ZQVPlatformText type;
     const auto number = static_cast<unsigned int>(_serviceIndices[position++]);
     if (zelqo_content_info_get_content_type(handle, number, type.out()) != ZELQO_ERROR_NONE) {
       ZQV_ERROR("zelqo_content_info_get_content_type");
@@ -182,7 +167,7 @@ void ZQVThumbnailFetcher::_reqMidThumbnail(zelqo_share_h handle) {
 
 void ZQVThumbnailFetcher::_reuseMidThumbnail(ZQViewerThumbnailItem* item, Urls* missing) {
   if (!item->midThumbUrl) return;
-  const PlatformText stored = preferenceOf(item->midThumbUrl);
+  const ZQVPlatformText stored = preferenceOf(item->midThumbUrl);
   if (!stored) {
     missing->push_back(item->midThumbUrl);
   } else if (*stored) {

@@ -6,8 +6,8 @@
 
 #include "ZQVCommon.h"
 #include "ZQVLog.h"
-#include "ZQVOwned.h"
 #include "ZQVPopupTexts.h"
+#include "ZQVSizeText.h"
 #include "ZQVText.h"
 
 namespace {
@@ -97,13 +97,9 @@ Evas_Object* ZQVWifiSelectPopup::_createContent(Evas_Object* popup) {
 }
 
 std::string ZQVWifiSelectPopup::_sizeMessage() const {
-  float value = 0;
-  ZQVOwnedText unit(
-      ZQViewerCommon::getInstance().zquiCommonConvertFileSizeUnit(_totalSize, &value));
-  char number[10] = "";
-  g_snprintf(number, sizeof number, "%.2f", value);
-  return zqvFormat("IDS_RSH_POP_THE_TOTAL_FILE_SIZE_IS_OVER_P1SS_P2SS_TO_AVOID_MSG", "ss", number,
-                   unit ? unit.get() : "");
+  const ZQVSizeText size(_totalSize);
+  return zqvFormat("IDS_RSH_POP_THE_TOTAL_FILE_SIZE_IS_OVER_P1SS_P2SS_TO_AVOID_MSG", "ss",
+                   size.number, size.unit.get());
 }
 
 void ZQVWifiSelectPopup::_clearOwnerSlot() {

@@ -28,7 +28,7 @@ std::string drawn(Evas_Object* label) {
   Evas_Textblock_Cursor* end = evas_object_textblock_cursor_new(block);
   evas_textblock_cursor_paragraph_first(start);
   evas_textblock_cursor_paragraph_last(end);
-  const ZQVOwned<char, free> text(
+  const ZQVPlatformText text(
       evas_textblock_cursor_range_text_get(start, end, EVAS_TEXTBLOCK_TEXT_PLAIN));
   evas_textblock_cursor_free(start);
   evas_textblock_cursor_free(end);

@@ -6,6 +6,7 @@
 #include "WGenlistItemGroup.h"
 #include "WGenlistItemMonoline1Check.h"
 #include "WGenlistItemMonoline1Icon.h"
+#include "ZQVContacts.h"
 #include "ZQVRows.h"
 
 class Rows : public ViewTest {

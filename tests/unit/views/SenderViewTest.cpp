@@ -2,6 +2,7 @@
 
 #include "ViewTest.h"
 #include "WGenlistItemMonoline1Icon.h"
+#include "ZQVContacts.h"
 
 using testing::Contains;
 using testing::ElementsAre;
