@@ -27,7 +27,7 @@ OwnedRequest newRequest(const char* appId, const char* operation) {
 void send(const OwnedRequest& request) {
   if (!request ||
       app_control_send_launch_request(request.get(), nullptr, nullptr) != APP_CONTROL_ERROR_NONE) {
-    showMessage(text("Unable to find an application for this"));
+    showMessage(text("No app found for this action"));
   }
 }
 
