@@ -38,17 +38,6 @@ void logFailure(sqlite3* handle, const char* what) {
   g_warning("database: %s: %s", what, handle ? sqlite3_errmsg(handle) : "out of memory");
 }
 
-// Two processes that create the file together: the switch to WAL fails as "locked" at once and
-// asks nobody whether to wait.
-bool switchToWal(sqlite3* handle) {
-  for (int i = 0; i < kWalTries; i++) {
-    const int result = sqlite3_exec(handle, "PRAGMA journal_mode=WAL", nullptr, nullptr, nullptr);
-    if (result != SQLITE_BUSY) return result == SQLITE_OK;
-    g_usleep(kWalPauseUs);
-  }
-  return false;
-}
-
 /// SQLite would set aside 130 KB for each connection, for small files of some hundred rows.
 void limitMemory() {
   sqlite3_config(SQLITE_CONFIG_PAGECACHE, nullptr, 0, 0);
@@ -62,6 +51,15 @@ int openSharedFile(const std::string& path, int flags, sqlite3** handle) {
   std::call_once(first, limitMemory);
   const int result = sqlite3_open_v2(path.c_str(), handle, flags, nullptr);
   if (*handle) sqlite3_busy_handler(*handle, busyCb, nullptr);
+  return result;
+}
+
+int switchToWal(sqlite3* handle) {
+  int result = SQLITE_BUSY;
+  for (int i = 0; i < kWalTries && result == SQLITE_BUSY; i++) {
+    if (i > 0) g_usleep(kWalPauseUs);
+    result = sqlite3_exec(handle, "PRAGMA journal_mode=WAL", nullptr, nullptr, nullptr);
+  }
   return result;
 }
 
@@ -147,7 +145,7 @@ std::unique_ptr<Database> Database::open(const std::string& path, const char* sc
 }
 
 bool Database::configure(const char* schema) {
-  return switchToWal(_handle.get()) && execute("PRAGMA synchronous=NORMAL") &&
+  return switchToWal(_handle.get()) == SQLITE_OK && execute("PRAGMA synchronous=NORMAL") &&
          execute("PRAGMA foreign_keys=ON") && execute(schema);
 }
 

@@ -1,5 +1,6 @@
 // The phone's agent: listens to the sharing service for the phone's number, from boot to shutdown,
 // and writes down what it hears.
+#include <common/Owned.h>
 #include <vconf.h>
 #include <zelqo/PhoneSettings.h>
 #include <zelqo/PushListener.h>
@@ -70,13 +71,10 @@ gboolean stopCb(gpointer loop) {
 }  // namespace
 
 int main() {
-  GMainLoop* loop = g_main_loop_new(nullptr, FALSE);
-  g_unix_signal_add(SIGTERM, stopCb, loop);
-  g_unix_signal_add(SIGINT, stopCb, loop);
-  {
-    const Agent agent;
-    g_main_loop_run(loop);
-  }
-  g_main_loop_unref(loop);
+  const common::Owned<GMainLoop, g_main_loop_unref> loop(g_main_loop_new(nullptr, FALSE));
+  g_unix_signal_add(SIGTERM, stopCb, loop.get());
+  g_unix_signal_add(SIGINT, stopCb, loop.get());
+  const Agent agent;
+  g_main_loop_run(loop.get());
   return 0;
 }

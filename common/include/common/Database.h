@@ -21,6 +21,10 @@ void makePrivateFile(const std::string& path);
 /// second, and for a while not at all when that was in vain. It takes little memory.
 int openSharedFile(const std::string& path, int flags, sqlite3** handle);
 
+/// SQLite's result. Two processes that make the file together collide here at once, whatever their
+/// patience: the switch is tried again for half a second.
+int switchToWal(sqlite3* handle);
+
 /// One execution of a prepared statement, reset when the use of it ends: bind in order, then step
 /// or run.
 class Statement {

@@ -5,6 +5,7 @@
 #include <cstring>
 
 using common::Owned;
+using common::OwnedObject;
 using common::OwnedText;
 using common::OwnedVariant;
 
@@ -41,7 +42,7 @@ void Recorder::_signalCb(GDBusConnection*, const char* sender, const char* path,
                          const char* interface, const char* member, GVariant* body, gpointer data) {
   const auto self = static_cast<Recorder*>(data);
   if (!self->_file || strcmp(interface, "org.freedesktop.DBus") == 0) return;
-  const Owned<JsonBuilder, g_object_unref> builder(json_builder_new());
+  const OwnedObject<JsonBuilder> builder(json_builder_new());
   json_builder_begin_object(builder.get());
   addText(builder.get(), "interface", interface);
   addText(builder.get(), "member", member);

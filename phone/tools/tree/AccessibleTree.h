@@ -46,7 +46,7 @@ class AccessibleTree {
   static void _answeredCb(GObject* bus, GAsyncResult* result, gpointer question);
 
   GDBusConnection* const _bus;
-  const common::Owned<GCancellable, g_object_unref> _cancellable;
+  const common::OwnedObject<GCancellable> _cancellable;
   std::string _name, _path;
   std::deque<std::unique_ptr<Question>> _waiting;
   int _open = 0;

@@ -14,35 +14,32 @@ struct CloseDisplay {
 };
 using DisplayOwner = std::unique_ptr<Display, CloseDisplay>;
 
-constexpr long kMostWindows = 1024;
+constexpr long kMostValues = 1024;
 
-std::vector<unsigned long> numbers(Display* display, Window window, const char* property) {
+/// A window's property, if its values have that many bits; Xlib keeps 32 bits in a long.
+template <typename Values>
+Values property(Display* display, Window window, const char* name, int bits) {
   Atom type = None;
   int format = 0;
   unsigned long count = 0, rest = 0;
   unsigned char* data = nullptr;
-  XGetWindowProperty(display, window, XInternAtom(display, property, False), 0, kMostWindows, False,
+  XGetWindowProperty(display, window, XInternAtom(display, name, False), 0, kMostValues, False,
                      AnyPropertyType, &type, &format, &count, &rest, &data);
-  std::vector<unsigned long> result;
-  if (format == 32) {
-    const auto* values = reinterpret_cast<unsigned long*>(data);
+  Values result;
+  if (format == bits) {
+    const auto* values = reinterpret_cast<const typename Values::value_type*>(data);
     result.assign(values, values + count);
   }
   if (data) XFree(data);
   return result;
 }
 
-std::string text(Display* display, Window window, const char* property) {
-  Atom type = None;
-  int format = 0;
-  unsigned long count = 0, rest = 0;
-  unsigned char* data = nullptr;
-  XGetWindowProperty(display, window, XInternAtom(display, property, False), 0, kMostWindows, False,
-                     AnyPropertyType, &type, &format, &count, &rest, &data);
-  std::string result;
-  if (format == 8) result.assign(reinterpret_cast<char*>(data), count);
-  if (data) XFree(data);
-  return result;
+std::vector<unsigned long> numbers(Display* display, Window window, const char* name) {
+  return property<std::vector<unsigned long>>(display, window, name, 32);
+}
+
+std::string text(Display* display, Window window, const char* name) {
+  return property<std::string>(display, window, name, 8);
 }
 
 Window viewable(Display* display, const std::vector<unsigned long>& bottomToTop) {
@@ -55,9 +52,10 @@ Window viewable(Display* display, const std::vector<unsigned long>& bottomToTop)
   return None;
 }
 
+/// A window may have been closed since it was listed.
 int ignoreError(Display*, XErrorEvent*) {
   return 0;
-}  // a window that has just been closed
+}
 
 }  // namespace
 

@@ -12,7 +12,7 @@
 namespace appfw {
 namespace {
 
-using OwnedBuilder = common::Owned<JsonBuilder, g_object_unref>;
+using OwnedBuilder = common::OwnedObject<JsonBuilder>;
 
 void addMember(JsonBuilder* builder, const char* name, const std::string& value) {
   json_builder_set_member_name(builder, name);

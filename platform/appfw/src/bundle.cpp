@@ -180,7 +180,7 @@ bundle* bundle_decode(const bundle_raw* r, const int len) {
   if (!r || len < static_cast<int>(kMagic.size()) || memcmp(r, kMagic.data(), kMagic.size()) != 0) {
     return nullptr;
   }
-  common::Owned<GBytes, g_bytes_unref> bytes(
+  common::OwnedBytes bytes(
       g_bytes_new(r + kMagic.size(), static_cast<size_t>(len) - kMagic.size()));
   OwnedVariant contents(
       g_variant_ref_sink(g_variant_new_from_bytes(G_VARIANT_TYPE_VARDICT, bytes.get(), FALSE)));

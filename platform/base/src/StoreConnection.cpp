@@ -1,7 +1,6 @@
 #include "StoreConnection.h"
 
 #include <common/Database.h>
-#include <unistd.h>
 
 namespace base {
 namespace {
@@ -42,7 +41,7 @@ int StoreConnection::open(const std::string& path, bool create) {
   int code = common::openSharedFile(path, flags, &db);
   _db.reset(db);
   if (code != SQLITE_OK) return code;
-  if ((code = switchToWal()) != SQLITE_OK) return code;
+  if ((code = common::switchToWal(_db.get())) != SQLITE_OK) return code;
   if ((code = execute("PRAGMA synchronous=NORMAL")) != SQLITE_OK) return code;
   code = execute("CREATE TABLE IF NOT EXISTS pref(k TEXT PRIMARY KEY, v) WITHOUT ROWID");
   return code == SQLITE_OK ? prepareAll() : code;
@@ -50,17 +49,6 @@ int StoreConnection::open(const std::string& path, bool create) {
 
 int StoreConnection::execute(const char* sql) {
   return sqlite3_exec(_db.get(), sql, nullptr, nullptr, nullptr);
-}
-
-/// Two processes that make the file together collide here at once, whatever their patience.
-int StoreConnection::switchToWal() {
-  constexpr int attempts = 100;
-  int code = SQLITE_BUSY;
-  for (int i = 0; i < attempts && code == SQLITE_BUSY; i++) {
-    if (i > 0) usleep(5000);
-    code = execute("PRAGMA journal_mode=WAL");
-  }
-  return code;
 }
 
 int StoreConnection::prepare(const char* sql, Statement& statement) {

@@ -30,7 +30,6 @@ class StoreConnection {
   using Statement = common::Owned<sqlite3_stmt, sqlite3_finalize>;
 
   int execute(const char* sql);
-  int switchToWal();
   int prepare(const char* sql, Statement& statement);
   int prepareAll();
 

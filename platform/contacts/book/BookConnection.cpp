@@ -6,19 +6,18 @@
 namespace contacts {
 
 using common::Out;
-using common::Owned;
 using common::OwnedError;
+using common::OwnedObject;
 
 constexpr guint32 kDoNotWaitForOnline = static_cast<guint32>(-1);
 
 OwnedBook openAddressBook() {
   const base::Deadline deadline(kPatience);
   OwnedError error;
-  const Owned<ESourceRegistry, g_object_unref> registry(
+  const OwnedObject<ESourceRegistry> registry(
       e_source_registry_new_sync(deadline.cancellable(), Out(error)));
   if (registry) {
-    const Owned<ESource, g_object_unref> source(
-        e_source_registry_ref_default_address_book(registry.get()));
+    const OwnedObject<ESource> source(e_source_registry_ref_default_address_book(registry.get()));
     EClient* client = e_book_client_connect_sync(source.get(), kDoNotWaitForOnline,
                                                  deadline.cancellable(), Out(error));
     if (client) return OwnedBook(E_BOOK_CLIENT(client));

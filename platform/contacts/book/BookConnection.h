@@ -10,9 +10,9 @@ namespace contacts {
 
 constexpr std::chrono::milliseconds kPatience{5000};
 
-using OwnedBook = common::Owned<EBookClient, g_object_unref>;
-using OwnedView = common::Owned<EBookClientView, g_object_unref>;
-using OwnedContact = common::Owned<EContact, g_object_unref>;
+using OwnedBook = common::OwnedObject<EBookClient>;
+using OwnedView = common::OwnedObject<EBookClientView>;
+using OwnedContact = common::OwnedObject<EContact>;
 
 inline void freeContacts(GSList* contacts) {
   g_slist_free_full(contacts, g_object_unref);

@@ -35,7 +35,7 @@ class PersonIndex {
 
   const std::function<void()> _onChange;
   std::unique_ptr<base::SignalSubscription> _changes;
-  common::Owned<GCancellable, g_object_unref> _fetching;  ///< null when nothing is under way
+  common::OwnedObject<GCancellable> _fetching;  ///< null when nothing is under way
   bool _isOutdated = false;  ///< what is under way may be older than the last change
   std::vector<Person> _persons;
 };

@@ -10,8 +10,8 @@ namespace {
 constexpr const char* kAttributes = G_FILE_ATTRIBUTE_STANDARD_TYPE
     "," G_FILE_ATTRIBUTE_STANDARD_FAST_CONTENT_TYPE "," G_FILE_ATTRIBUTE_TIME_MODIFIED;
 
-using OwnedFile = common::Owned<GFile, g_object_unref>;
-using OwnedInfo = common::Owned<GFileInfo, g_object_unref>;
+using OwnedFile = common::OwnedObject<GFile>;
+using OwnedInfo = common::OwnedObject<GFileInfo>;
 
 OwnedInfo query(const std::string& path, const char* attributes) {
   const OwnedFile file(g_file_new_for_path(path.c_str()));

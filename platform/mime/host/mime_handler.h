@@ -8,7 +8,7 @@
 
 namespace mime {
 
-using OwnedAppInfo = common::Owned<GAppInfo, g_object_unref>;
+using OwnedAppInfo = common::OwnedObject<GAppInfo>;
 
 /// The MIME type of a file's content; its name only refines it (a zip archive that is named .docx).
 /// Empty when the file may not be opened: not a plain readable file, a link, executable, a script,

@@ -26,7 +26,7 @@ class TimeZoneWatch {
   void apply(const std::string& zone);
 
   std::function<void()> _onChanged;
-  common::Owned<GCancellable, g_object_unref> _asking{g_cancellable_new()};
+  common::OwnedObject<GCancellable> _asking{g_cancellable_new()};
   base::SignalSubscription _subscription;
   base::BusReturn _busReturn;
 };

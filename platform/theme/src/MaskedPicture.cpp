@@ -15,7 +15,7 @@ constexpr int kMaxSide = 4096;
 /// A picture that claims more is not decoded at all.
 constexpr int64_t kMaxPixels = 100'000'000;
 
-using OwnedPixbuf = common::Owned<GdkPixbuf, g_object_unref>;
+using OwnedPixbuf = common::OwnedObject<GdkPixbuf>;
 
 Pixels pixelsOf(const GdkPixbuf* pixbuf) {
   return {gdk_pixbuf_read_pixels(pixbuf),

@@ -1,19 +1,15 @@
 #include "zelqo/PhoneSettings.h"
 
+#include <common/Owned.h>
 #include <vconf.h>
 
 #include <cstdlib>
-#include <memory>
 
 namespace zelqo {
 namespace {
 
-struct Free {
-  void operator()(char* text) const { free(text); }
-};
-
 std::string setting(const char* key) {
-  const std::unique_ptr<char, Free> text(vconf_get_str(key));
+  const common::Owned<char, std::free> text(vconf_get_str(key));
   return text ? text.get() : "";
 }
 

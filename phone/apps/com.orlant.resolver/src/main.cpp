@@ -28,7 +28,7 @@ std::string pathOf(app_control_h request) {
 std::string open(const std::string& path) {
   const auto handler = mime::handlerFor(path);
   if (!handler) return "no program for this file";
-  const common::Owned<GFile, g_object_unref> file(g_file_new_for_path(path.c_str()));
+  const common::OwnedObject<GFile> file(g_file_new_for_path(path.c_str()));
   GList files{file.get(), nullptr, nullptr};
   common::OwnedError error;
   g_app_info_launch(handler.get(), &files, nullptr, common::Out(error));

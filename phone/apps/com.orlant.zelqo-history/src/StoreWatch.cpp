@@ -10,9 +10,9 @@ namespace {
 constexpr double kBurstSeconds = 0.1;
 constexpr const char* kStore = "zelqo.db";
 
-common::Owned<GFileMonitor, g_object_unref> watchFolder(const std::string& folder) {
-  const common::Owned<GFile, g_object_unref> file(g_file_new_for_path(folder.c_str()));
-  return common::Owned<GFileMonitor, g_object_unref>(
+common::OwnedObject<GFileMonitor> watchFolder(const std::string& folder) {
+  const common::OwnedObject<GFile> file(g_file_new_for_path(folder.c_str()));
+  return common::OwnedObject<GFileMonitor>(
       g_file_monitor_directory(file.get(), G_FILE_MONITOR_NONE, nullptr, nullptr));
 }
 

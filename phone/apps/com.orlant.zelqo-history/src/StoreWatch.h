@@ -27,7 +27,7 @@ class StoreWatch {
   void _changed();
 
   std::function<void()> _onChange;
-  common::Owned<GFileMonitor, g_object_unref> _monitor;
+  common::OwnedObject<GFileMonitor> _monitor;
   base::SignalSubscription _recalled;
   Ecore_Timer* _timer = nullptr;
 };

@@ -1,30 +1,24 @@
 #include "companion/ContactBook.h"
 
+#include <common/Owned.h>
 #include <contacts.h>
 #include <glib.h>
 
 #include <algorithm>
 #include <clocale>
-#include <memory>
 #include <type_traits>
 
 namespace companion {
 namespace {
 
-template <typename Handle, int (*Destroy)(Handle)>
-struct DestroyWith {
-  void operator()(std::remove_pointer_t<Handle>* handle) const { Destroy(handle); }
-};
-using OwnedFilter = std::unique_ptr<std::remove_pointer_t<contacts_filter_h>,
-                                    DestroyWith<contacts_filter_h, contacts_filter_destroy>>;
-using OwnedQuery = std::unique_ptr<std::remove_pointer_t<contacts_query_h>,
-                                   DestroyWith<contacts_query_h, contacts_query_destroy>>;
-struct DestroyList {
-  void operator()(std::remove_pointer_t<contacts_list_h>* list) const {
-    contacts_list_destroy(list, true);
-  }
-};
-using OwnedList = std::unique_ptr<std::remove_pointer_t<contacts_list_h>, DestroyList>;
+void destroyWithRecords(contacts_list_h list) {
+  contacts_list_destroy(list, true);
+}
+
+using OwnedFilter =
+    common::Owned<std::remove_pointer_t<contacts_filter_h>, contacts_filter_destroy>;
+using OwnedQuery = common::Owned<std::remove_pointer_t<contacts_query_h>, contacts_query_destroy>;
+using OwnedList = common::Owned<std::remove_pointer_t<contacts_list_h>, destroyWithRecords>;
 
 const auto& kView = _contacts_person_number;
 

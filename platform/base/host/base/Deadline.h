@@ -20,7 +20,7 @@ class Deadline {
   GCancellable* cancellable() const { return _cancellable.get(); }
 
  private:
-  common::Owned<GCancellable, g_object_unref> _cancellable;
+  common::OwnedObject<GCancellable> _cancellable;
   std::mutex _mutex;
   std::condition_variable _done;
   bool _isDone = false;
