@@ -6,6 +6,8 @@
 #include <fstream>
 #include <memory>
 
+#include "User.h"
+
 namespace fs = std::filesystem;
 using phone::Colour;
 using phone::Share;
@@ -19,11 +21,6 @@ struct Release {
   void operator()(void* object) const { g_object_unref(object); }
   void operator()(GBytes* bytes) const { g_bytes_unref(bytes); }
 };
-
-testing::AssertionResult result(bool came, const std::string& what) {
-  if (came) return testing::AssertionSuccess();
-  return testing::AssertionFailure() << what << " on\n" << thePhone().tree();
-}
 
 }  // namespace
 
@@ -62,7 +59,7 @@ long serviceCount(const std::string& kind) {
 }
 
 std::string writtenFile(const std::string& name, const std::string& content) {
-  const std::string path = thePhone().makeFile(name, 0);
+  std::string path = thePhone().makeFile(name, 0);
   std::ofstream(path, std::ios::binary) << content;
   return path;
 }
@@ -92,23 +89,23 @@ testing::AssertionResult cellShows(const std::string& name, const Colour& colour
 }
 
 testing::AssertionResult cellIs(const std::string& name, const std::string& state) {
-  return result(waitFor([&] {
-                  const Tree tree = thePhone().tree();
-                  for (const auto& item : tree.items()) {
-                    if (item.name.rfind(name + ", ", 0) != 0) continue;
-                    const std::string end = ", " + state;
-                    return item.name.size() > end.size() &&
-                           item.name.compare(item.name.size() - end.size(), end.size(), end) == 0;
-                  }
-                  return false;
-                }),
-                "\"" + name + "\" is not " + state);
+  return seen(thePhone(), waitFor([&] {
+                const Tree tree = thePhone().tree();
+                for (const auto& item : tree.items()) {
+                  if (item.name.rfind(name + ", ", 0) != 0) continue;
+                  const std::string end = ", " + state;
+                  return item.name.size() > end.size() &&
+                         item.name.compare(item.name.size() - end.size(), end.size(), end) == 0;
+                }
+                return false;
+              }),
+              "\"" + name + "\" is not " + state);
 }
 
 testing::AssertionResult downloadIsEnabled(bool isEnabled) {
-  return result(waitFor([=] {
-                  const Tree tree = thePhone().tree();
-                  return tree.named("Download") && tree.enables("Download") == isEnabled;
-                }),
-                isEnabled ? "no enabled Download" : "no disabled Download");
+  return seen(thePhone(), waitFor([=] {
+                const Tree tree = thePhone().tree();
+                return tree.named("Download") && tree.enables("Download") == isEnabled;
+              }),
+              isEnabled ? "no enabled Download" : "no disabled Download");
 }

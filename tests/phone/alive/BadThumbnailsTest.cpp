@@ -47,8 +47,9 @@ TEST_F(BadThumbnails, LeaveTheIconOfTheirKind) {
        writtenFile("Text.png", "Just words.\n"), makePicture(thePhone(), "Good.png", kGreen)});
   std::string files;
   const char* names[] = {"Cut.png", "Huge.png", "Empty.png", "Text.png", "Good.png"};
-  for (int i = 0; i < 5; i++)
+  for (int i = 0; i < 5; i++) {
     files += (i ? "," : "[") + entry(names[i], addressOf(source, "file", i));
+  }
   thePhone().launchReceived(announced(files + "]").token);
   ASSERT_TRUE(cellShows("Good.png", kGreen));
   const std::string before = viewerProcess();

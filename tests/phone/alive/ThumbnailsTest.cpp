@@ -19,9 +19,9 @@ using Thumbnails = AlivePage;
 
 // A share of three pictures, of which everything has been fetched.
 Share fetchedShare() {
-  const Share share = thePhone().share({makePicture(thePhone(), "Red.png", kRed),
-                                        makePicture(thePhone(), "Green.jpg", kGreen),
-                                        makePicture(thePhone(), "Blue.png", kBlue, 900, 600)});
+  Share share = thePhone().share({makePicture(thePhone(), "Red.png", kRed),
+                                  makePicture(thePhone(), "Green.jpg", kGreen),
+                                  makePicture(thePhone(), "Blue.png", kBlue, 900, 600)});
   thePhone().launchReceived(share.token);
   EXPECT_TRUE(cellShows("Red.png", kRed));
   EXPECT_TRUE(waitFor([&] {

@@ -14,12 +14,10 @@ constexpr const char* kPicker = "contacts-tabui-efl";
 
 /// Opens an application's start page.
 void open(const char* application);
-/// Waits for a widget whose name begins so; false, with what is on screen, when it never comes.
+/// As in User.h, on the one phone.
 testing::AssertionResult comes(const std::string& name);
 testing::AssertionResult goes(const std::string& name);
-/// Waits for it and taps it.
 testing::AssertionResult tap(const std::string& name);
-/// Waits for a status-bar message that contains the text.
 testing::AssertionResult says(const std::string& text);
 
 std::string contentOf(const std::string& path);

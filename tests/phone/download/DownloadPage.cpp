@@ -4,6 +4,7 @@
 #include <sstream>
 
 #include "Transfers.h"
+#include "User.h"
 
 namespace fs = std::filesystem;
 using phone::Share;
@@ -13,21 +14,11 @@ using phone::Words;
 
 namespace {
 
-testing::AssertionResult result(bool came, const std::string& what) {
-  if (came) return testing::AssertionSuccess();
-  return testing::AssertionFailure() << what << " on\n" << thePhone().tree();
-}
-
 bool endsWith(const std::string& text, const std::string& end) {
   return text.size() >= end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
 }
 
 }  // namespace
-
-std::string centreOf(const phone::Widget& widget) {
-  return std::to_string(widget.area.x + widget.area.width / 2) + "," +
-         std::to_string(widget.area.y + widget.area.height / 2);
-}
 
 void DownloadPage::SetUp() {
   // One that is still there would take the taps on the title bar.
@@ -114,15 +105,15 @@ testing::AssertionResult tapInPopup(const std::string& button) {
     return !centre.empty();
   });
   if (came) thePhone()({"tap", centre});
-  return result(came, "no popup with \"" + button + "\"");
+  return seen(thePhone(), came, "no popup with \"" + button + "\"");
 }
 
 testing::AssertionResult titleIs(const std::string& title) {
-  return result(waitFor([&] {
-                  const auto pages = thePhone().tree().withRole("page tab");
-                  return !pages.empty() && pages.back().name == title;
-                }),
-                "no page \"" + title + "\"");
+  return seen(thePhone(), waitFor([&] {
+                const auto pages = thePhone().tree().withRole("page tab");
+                return !pages.empty() && pages.back().name == title;
+              }),
+              "no page \"" + title + "\"");
 }
 
 Words selectedItems() {
@@ -146,6 +137,6 @@ size_t downloadedCells() {
 }
 
 testing::AssertionResult downloadedCellsAre(size_t count) {
-  return result(waitFor([=] { return downloadedCells() == count; }),
-                "not " + std::to_string(count) + " downloaded cells");
+  return seen(thePhone(), waitFor([=] { return downloadedCells() == count; }),
+              "not " + std::to_string(count) + " downloaded cells");
 }

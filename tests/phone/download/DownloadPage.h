@@ -43,8 +43,6 @@ phone::Words papers(int count);
 testing::AssertionResult selectFrom(const phone::Share& share);
 /// Taps the button of that name in the popup; the page behind it may have one, too.
 testing::AssertionResult tapInPopup(const std::string& button);
-/// Where to tap it.
-std::string centreOf(const phone::Widget& widget);
 /// Waits until the page has that title.
 testing::AssertionResult titleIs(const std::string& title);
 /// Names of the cells and rows that are selected.

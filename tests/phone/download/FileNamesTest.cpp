@@ -8,6 +8,7 @@
 
 #include "DownloadPage.h"
 #include "FullPage.h"
+#include "User.h"
 
 namespace fs = std::filesystem;
 using phone::Share;

@@ -15,7 +15,7 @@ using phone::waitFor;
 
 namespace {
 
-constexpr size_t kPiece = 64 * 1024;
+constexpr size_t kPiece = size_t{64} * 1024;
 
 // Ends the reads and writes of other threads, too.
 void hangUp(GSocketConnection* connection) {
@@ -56,7 +56,7 @@ size_t arrived() {
 
 std::string makeLargeFile(const std::string& name, size_t megabytes) {
   constexpr size_t kStretch = 512;
-  const std::string path = thePhone().makeFile(name, 0);
+  std::string path = thePhone().makeFile(name, 0);
   std::ofstream file(path, std::ios::binary);
   std::string block(kMegabyte, '\0');
   for (size_t i = 0; i < megabytes; i++) {

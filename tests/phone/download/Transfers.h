@@ -14,7 +14,7 @@
 
 #include "Phone.h"
 
-constexpr size_t kMegabyte = 1024 * 1024;
+constexpr size_t kMegabyte = size_t{1024} * 1024;
 
 /// A file whose every stretch is different, so that a wrong join shows.
 std::string makeLargeFile(const std::string& name, size_t megabytes);

@@ -15,7 +15,7 @@ namespace {
 using BadPictures = FullPage;
 
 std::string written(const std::string& name, const std::string& content) {
-  const std::string path = thePhone().makeFile(name, 0);
+  std::string path = thePhone().makeFile(name, 0);
   std::ofstream(path, std::ios::binary) << content;
   return path;
 }

@@ -2,6 +2,8 @@
 
 #include <filesystem>
 
+#include "User.h"
+
 namespace fs = std::filesystem;
 using phone::Area;
 using phone::thePhone;
@@ -18,11 +20,6 @@ constexpr const char* kNoApplication = "No app found for this action.";
 
 bool isSame(const Area& a, const Area& b) {
   return a.x == b.x && a.y == b.y && a.width == b.width && a.height == b.height;
-}
-
-testing::AssertionResult result(bool came, const std::string& what) {
-  if (came) return testing::AssertionSuccess();
-  return testing::AssertionFailure() << what << " on\n" << thePhone().tree();
 }
 
 // The place of the page that fills the pager, from 1; 0 while none does.
@@ -46,7 +43,7 @@ testing::AssertionResult buttonIs(const std::string& name, const std::string& st
     }
     return false;
   });
-  return result(came, "no " + state + " \"" + name + "\"");
+  return seen(thePhone(), came, "no " + state + " \"" + name + "\"");
 }
 
 void tapCell(const std::string& name) {
@@ -100,13 +97,14 @@ Area pageArea(const Tree& tree) {
 }
 
 testing::AssertionResult pageNumberIs(size_t number) {
-  return result(waitFor([&] { return pageNumberOn(thePhone().tree()) == number; }),
-                "not page " + std::to_string(number));
+  return seen(thePhone(), waitFor([&] { return pageNumberOn(thePhone().tree()) == number; }),
+              "not page " + std::to_string(number));
 }
 
 testing::AssertionResult pageIs(const std::string& name) {
-  return result(waitFor([&] { return pageOn(thePhone().tree()).rfind(name + ", ", 0) == 0; }),
-                "\"" + name + "\" is not the page");
+  return seen(thePhone(),
+              waitFor([&] { return pageOn(thePhone().tree()).rfind(name + ", ", 0) == 0; }),
+              "\"" + name + "\" is not the page");
 }
 
 // Far enough to turn the page however slow the machine is.
@@ -146,5 +144,5 @@ testing::AssertionResult openIsRefused() {
   const size_t before = refusals();
   const testing::AssertionResult tapped = tap("Open");
   if (!tapped) return tapped;
-  return result(waitFor([&] { return refusals() == before + 1; }), "no message");
+  return seen(thePhone(), waitFor([&] { return refusals() == before + 1; }), "no message");
 }

@@ -21,7 +21,7 @@ std::string manifestOf(int files) {
     json += (i > 1 ? R"(,{"name":")" : R"([{"name":")") + file(i) +
             R"(","size":1,"type":"text/plain"})";
   }
-  const std::string path = thePhone().makeFile("manifest.json", 0);
+  std::string path = thePhone().makeFile("manifest.json", 0);
   std::ofstream(path) << json << ']';
   return path;
 }

@@ -5,59 +5,9 @@
 using phone::Phone;
 using phone::Share;
 using phone::thePhone;
-using phone::Tree;
 using phone::waitFor;
 using phone::Widget;
 using phone::Words;
-
-namespace {
-
-testing::AssertionResult result(const Phone& phone, bool came, const std::string& what) {
-  if (came) return testing::AssertionSuccess();
-  return testing::AssertionFailure() << what << " on\n" << phone.tree();
-}
-
-// The page may have a title of the same name.
-const Widget* touchable(const Tree& tree, const std::string& name) {
-  for (const Widget& widget : tree.widgets()) {
-    const bool takesTaps = widget.role == "push button" || widget.role == "list item";
-    if (takesTaps && widget.is("enabled") && widget.name.rfind(name, 0) == 0) return &widget;
-  }
-  return nullptr;
-}
-
-}  // namespace
-
-testing::AssertionResult comes(const Phone& phone, const std::string& name) {
-  return result(phone, waitFor([&] { return phone.tree().named(name) != nullptr; }),
-                "no \"" + name + "\"");
-}
-
-testing::AssertionResult goes(const Phone& phone, const std::string& name) {
-  return result(phone, waitFor([&] { return phone.tree().named(name) == nullptr; }),
-                "still \"" + name + "\"");
-}
-
-testing::AssertionResult tap(const Phone& phone, const std::string& name) {
-  std::string centre;
-  const bool came = waitFor([&] {
-    const Tree tree = phone.tree();
-    const Widget* widget = touchable(tree, name);
-    if (!widget) return false;
-    centre = std::to_string(widget->area.x + widget->area.width / 2) + "," +
-             std::to_string(widget->area.y + widget->area.height / 2);
-    return true;
-  });
-  if (came) phone({"tap", centre});
-  return result(phone, came, "no enabled \"" + name + "\"");
-}
-
-testing::AssertionResult says(const Phone& phone, const std::string& text) {
-  if (waitFor([&] { return phone({"messages"}).find(text) != std::string::npos; })) {
-    return testing::AssertionSuccess();
-  }
-  return testing::AssertionFailure() << "never said: " << text << "\nbut\n" << phone({"messages"});
-}
 
 testing::AssertionResult shows(const Phone& phone, std::size_t cells) {
   const auto count = [&] {
@@ -67,13 +17,13 @@ testing::AssertionResult shows(const Phone& phone, std::size_t cells) {
     }
     return found;
   };
-  return result(phone, waitFor([&] { return count() == cells; }),
-                "not " + std::to_string(cells) + " cells");
+  return seen(phone, waitFor([&] { return count() == cells; }),
+              "not " + std::to_string(cells) + " cells");
 }
 
 testing::AssertionResult viewerEnds(const Phone& phone) {
-  return result(phone, waitFor([&] { return phone.processesOf({"zelqo-viewer"}).empty(); }),
-                "the viewer runs");
+  return seen(phone, waitFor([&] { return phone.processesOf({"zelqo-viewer"}).empty(); }),
+              "the viewer runs");
 }
 
 Words linesWith(const Phone& phone, const std::string& command, const std::string& text) {

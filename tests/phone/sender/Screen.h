@@ -6,7 +6,7 @@
 #include <memory>
 #include <string>
 
-#include "Phone.h"
+#include "User.h"
 
 constexpr const char* kHistory = "com.orlant.zelqo-history";
 constexpr const char* kSignUp = "com.orlant.ovuport";
@@ -16,13 +16,6 @@ constexpr const char* kOwnNumber = "+821012345678";
 constexpr const char* kSecondNumber = "+821099998888";
 constexpr const char* kThirdNumber = "+821077776666";
 
-/// Waits for a widget whose name begins so; false, with what is on screen, when it never comes.
-testing::AssertionResult comes(const phone::Phone& phone, const std::string& name);
-testing::AssertionResult goes(const phone::Phone& phone, const std::string& name);
-/// Waits for an enabled button or item whose name begins so, and taps it.
-testing::AssertionResult tap(const phone::Phone& phone, const std::string& name);
-/// Waits for a status-bar message that contains the text.
-testing::AssertionResult says(const phone::Phone& phone, const std::string& text);
 /// Waits until the page shows that many cells.
 testing::AssertionResult shows(const phone::Phone& phone, std::size_t cells);
 /// Waits until the viewer has ended.

@@ -65,8 +65,9 @@ std::vector<std::string> complaintsAbout(const Look& look, bool isTextLarger) {
     if (isHiddenInPart(text, look)) complain(text, "is hidden in part");
     if (text.scale < kSmallest * unit(look) / kDesignWidth) complain(text, "is too small");
     for (size_t j = 0; j < i; j++) {
-      if (lieOverEachOther(text, look.texts[j]))
+      if (lieOverEachOther(text, look.texts[j])) {
         complain(text, "lies over " + quoted(look.texts[j]));
+      }
     }
   }
   return all;
