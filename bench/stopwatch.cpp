@@ -143,7 +143,7 @@ void printFrames(const Frames& frames) {
 }
 
 int scroll(PhoneScreen& screen, double seconds) {
-  constexpr double kTurnMs = 100;  // a steady hand: some 4,000 pixels a second
+  constexpr double kTurnMs = 100;  // a steady hand: 1,000 files in five seconds
   Finger finger(screen.display());
   Frames frames;
   finger.moveTo(screen.width() / 2, screen.height() / 2);

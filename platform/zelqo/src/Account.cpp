@@ -11,15 +11,8 @@ namespace {
 constexpr guint kDeadlineMs = 15000;
 
 std::string credentials(const std::string& msisdn, const std::string& imsi) {
-  const common::Owned<JsonBuilder, g_object_unref> json(json_builder_new());
-  json_builder_begin_object(json.get());
-  json_builder_set_member_name(json.get(), "msisdn");
-  json_builder_add_string_value(json.get(), msisdn.c_str());
-  json_builder_set_member_name(json.get(), "imsi");
-  json_builder_add_string_value(json.get(), imsi.c_str());
-  json_builder_end_object(json.get());
-  const common::JsonTree root(json_builder_get_root(json.get()));
-  return common::writeJson(root.get());
+  common::JsonWriter json;
+  return json.open().text("msisdn", msisdn).text("imsi", imsi).close().str();
 }
 
 std::string textOf(const ServiceClient::Reply& reply, const char* member) {

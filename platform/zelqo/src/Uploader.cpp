@@ -19,18 +19,6 @@ constexpr guint kAccepted = 202;
 constexpr guint kUnauthorized = 401;
 constexpr std::int64_t kMaxFileSize = 0xffffffff;
 
-using Builder = common::Owned<JsonBuilder, g_object_unref>;
-
-void addText(JsonBuilder* json, const char* member, const std::string& text) {
-  json_builder_set_member_name(json, member);
-  json_builder_add_string_value(json, text.c_str());
-}
-
-void addNumber(JsonBuilder* json, const char* member, std::int64_t number) {
-  json_builder_set_member_name(json, member);
-  json_builder_add_int_value(json, number);
-}
-
 std::string nameOf(const std::string& path) {
   const common::OwnedText name(g_path_get_basename(path.c_str()));
   const common::OwnedText valid(g_utf8_make_valid(name.get(), -1));
@@ -115,37 +103,26 @@ void Uploader::signUp() {
 }
 
 std::string Uploader::announcement() const {
-  const Builder json(json_builder_new());
-  json_builder_begin_object(json.get());
-  addText(json.get(), "from", _request.from);
-  addNumber(json.get(), "expires_in_s", _request.lifetimeS);
-  json_builder_set_member_name(json.get(), "single");
-  json_builder_add_boolean_value(json.get(), _request.single);
-  json_builder_set_member_name(json.get(), "to");
-  json_builder_begin_array(json.get());
-  for (const std::string& number : _request.to) {
-    json_builder_add_string_value(json.get(), number.c_str());
-  }
-  json_builder_end_array(json.get());
-  json_builder_set_member_name(json.get(), "lenient");
-  json_builder_add_boolean_value(json.get(), !_request.rawFiles.empty());
-  json_builder_set_member_name(json.get(), "files");
+  common::JsonWriter json;
+  json.open();
+  json.text("from", _request.from);
+  json.number("expires_in_s", _request.lifetimeS);
+  json.flag("single", _request.single);
+  json.openArray("to");
+  for (const std::string& number : _request.to) json.item(number);
+  json.closeArray();
+  json.flag("lenient", !_request.rawFiles.empty());
   if (!_request.rawFiles.empty()) {
-    json_builder_add_value(json.get(), json_from_string(_request.rawFiles.c_str(), nullptr));
+    const common::JsonTree raw(json_from_string(_request.rawFiles.c_str(), nullptr));
+    json.tree("files", raw.get());
   } else {
-    json_builder_begin_array(json.get());
+    json.openArray("files");
     for (const File& file : _files) {
-      json_builder_begin_object(json.get());
-      addText(json.get(), "name", file.name);
-      addNumber(json.get(), "size", file.size);
-      addText(json.get(), "type", file.type);
-      json_builder_end_object(json.get());
+      json.open().text("name", file.name).number("size", file.size).text("type", file.type).close();
     }
-    json_builder_end_array(json.get());
+    json.closeArray();
   }
-  json_builder_end_object(json.get());
-  const common::JsonTree root(json_builder_get_root(json.get()));
-  return common::writeJson(root.get());
+  return json.close().str();
 }
 
 void Uploader::announce() {

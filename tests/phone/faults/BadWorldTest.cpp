@@ -13,7 +13,6 @@
 #include "ViewerSetting.h"
 
 namespace fs = std::filesystem;
-using phone::Share;
 using phone::thePhone;
 using phone::waitFor;
 using phone::Words;
@@ -125,7 +124,7 @@ TEST_F(Preloaded, FoldersThatCannotBeWrittenDoNoHarm) {
 }
 
 TEST_F(Preloaded, ClockThatJumpsMakesTheShareExpireAndBack) {
-  constexpr int64_t kYear = 365 * 24 * 3600;
+  constexpr int64_t kYear = int64_t{365} * 24 * 3600;
   const Clock clock;
   const ViewerSetting setting(Clock::environment());
   thePhone().launchReceived(_journey.received().token);

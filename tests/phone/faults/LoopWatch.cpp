@@ -66,7 +66,7 @@ std::string LoopWatch::ask(const std::string& order) {
   g_output_stream_write_all(input, line.data(), line.size(), nullptr, nullptr, nullptr);
   g_output_stream_flush(input, nullptr, nullptr);
   char* answer = g_data_input_stream_read_line(_answers.get(), nullptr, nullptr, nullptr);
-  const std::string text = answer ? answer : "";
+  std::string text = answer ? answer : "";
   g_free(answer);
   return text;
 }
