@@ -9,8 +9,6 @@ namespace zelqo {
 namespace {
 
 constexpr std::size_t kMaxAddress = 2048;
-/// Where the disk is slower than the service, so many pictures wait in memory for each connection.
-constexpr int kUnsavedPerConnection = 1;
 
 // Addresses let their holder in, so the log does not get them whole.
 std::string nameInLog(const std::string& url) {
@@ -41,28 +39,14 @@ struct Downloader::Job {
 
 struct Downloader::Transfer {
   Job job;
-  std::string content;
-  std::unique_ptr<HttpFetch> fetch;  ///< none while the content is saved
-};
-
-/// What the thread gets, and gives back.
-struct Downloader::Saving {
-  std::shared_ptr<Downloader*> owner;
-  Transfer* transfer;  ///< there as long as the owner is
-  std::string folder;
-  std::string url;
-  std::string content;
-  PictureSaved result = PictureSaved::Failed;
-  std::string path;
+  std::unique_ptr<PictureFile> file;
+  std::unique_ptr<HttpFetch> fetch;
 };
 
 Downloader::Downloader(const Options& options)
-    : _options(options),
-      _session(makeSession(options.connections, options.inactivityS)),
-      _self(std::make_shared<Downloader*>(this)) {}
+    : _options(options), _session(makeSession(options.connections, options.inactivityS)) {}
 
 Downloader::~Downloader() {
-  *_self = nullptr;
   if (_pump) g_source_remove(_pump);
   for (const Job& job : _pausing) g_source_remove(job.timer);
 }
@@ -73,7 +57,7 @@ Downloader& Downloader::instance() {
 }
 
 void Downloader::add(Order order) {
-  if (_cleaned.insert(order.folder).second) removePictureLeftovers(order.folder);
+  if (_cleaned.insert(order.folder).second) PictureFile::removeLeftovers(order.folder);
   const std::size_t count = order.urls.size();
   auto batch = std::make_shared<Batch>(Batch{++_lastRequest, std::move(order), count});
   for (std::size_t i = 0; i < count; i++) _waiting.push_back(Job{batch, i});
@@ -92,9 +76,7 @@ gboolean Downloader::pumpCb(gpointer self) {
 }
 
 void Downloader::pump() {
-  const int most = _options.connections * (1 + kUnsavedPerConnection);
-  while (!_waiting.empty() && _fetching < _options.connections &&
-         _active.size() < static_cast<std::size_t>(most)) {
+  while (!_waiting.empty() && _active.size() < static_cast<std::size_t>(_options.connections)) {
     Job job = std::move(_waiting.front());
     _waiting.pop_front();
     start(std::move(job));
@@ -110,82 +92,42 @@ void Downloader::start(Job job) {
     return;
   }
   Transfer& transfer = _active.emplace_back();
+  transfer.file = std::make_unique<PictureFile>(job.batch->order.folder, job.url());
   transfer.job = std::move(job);
-  _fetching++;
   transfer.fetch = std::make_unique<HttpFetch>(
       _session.get(), std::move(message), _options.limits,
-      [&transfer](guint status, const char* data, gsize size) {
-        if (status == SOUP_STATUS_OK) transfer.content.append(data, size);
-        return true;
+      [file = transfer.file.get()](guint status, const char* data, gsize size) {
+        return status != SOUP_STATUS_OK || file->write(data, size);
       },
       [this, &transfer](const HttpFetch::Outcome& outcome) { transferred(transfer, outcome); });
 }
 
 void Downloader::transferred(Transfer& transfer, const HttpFetch::Outcome& outcome) {
-  _fetching--;
+  Job job = std::move(transfer.job);
+  const std::unique_ptr<PictureFile> file = std::move(transfer.file);
+  _active.remove_if([&transfer](const Transfer& other) { return &other == &transfer; });
   schedulePump();
-  if (outcome.error == ZELQO_ERROR_NONE) {
-    save(transfer);
-    return;
+
+  int error = outcome.error;
+  std::string reason = outcome.reason;
+  if (error == ZELQO_ERROR_NONE) {
+    switch (file->finish()) {
+      case PictureFile::Result::Whole:
+        report(job, ZELQO_ERROR_NONE, file->path().c_str());
+        return;
+      case PictureFile::Result::NoPicture:
+        error = ZELQO_ERROR_REFUSED;
+        reason = "not a picture";
+        break;
+      case PictureFile::Result::Failed:
+        error = ZELQO_ERROR_STORE;
+        break;
+    }
   }
-  Job job = take(transfer);
   if (outcome.transient() && job.attempts < _options.retries) {
     retryLater(std::move(job));
-  } else {
-    failed(job, outcome.error, outcome.reason);
+    return;
   }
-}
-
-/// A disk may take its time, and the main thread has a page to show.
-void Downloader::save(Transfer& transfer) {
-  auto saving = std::make_unique<Saving>();
-  saving->owner = _self;
-  saving->transfer = &transfer;
-  saving->folder = transfer.job.batch->order.folder;
-  saving->url = transfer.job.url();
-  saving->content = std::move(transfer.content);
-  transfer.fetch.reset();
-  const common::OwnedObject<GTask> task(g_task_new(nullptr, nullptr, savedCb, nullptr));
-  g_task_set_task_data(task.get(), saving.release(),
-                       [](gpointer data) { delete static_cast<Saving*>(data); });
-  g_task_run_in_thread(task.get(), saveInThread);
-}
-
-void Downloader::saveInThread(GTask* task, gpointer, gpointer data, GCancellable*) {
-  auto* saving = static_cast<Saving*>(data);
-  saving->result = savePicture(saving->folder, saving->url, saving->content, saving->path);
-  g_task_return_boolean(task, TRUE);
-}
-
-void Downloader::savedCb(GObject*, GAsyncResult* result, gpointer) {
-  const auto* saving = static_cast<const Saving*>(g_task_get_task_data(G_TASK(result)));
-  Downloader* downloader = *saving->owner;
-  if (downloader) downloader->saved(*saving->transfer, *saving);
-}
-
-void Downloader::saved(Transfer& transfer, const Saving& saving) {
-  const Job job = take(transfer);
-  schedulePump();
-  switch (saving.result) {
-    case PictureSaved::Whole:
-      report(job, ZELQO_ERROR_NONE, saving.path.c_str());
-      break;
-    case PictureSaved::NoPicture:
-      failed(job, ZELQO_ERROR_REFUSED, "not a picture");
-      break;
-    case PictureSaved::Failed:
-      failed(job, ZELQO_ERROR_STORE, "it cannot be kept");
-      break;
-  }
-}
-
-Downloader::Job Downloader::take(Transfer& transfer) {
-  Job job = std::move(transfer.job);
-  _active.remove_if([&transfer](const Transfer& other) { return &other == &transfer; });
-  return job;
-}
-
-void Downloader::failed(const Job& job, int error, const std::string& reason) {
   g_warning("zelqo: %s was not fetched: %s", nameInLog(job.url()).c_str(), reason.c_str());
   report(job, error, nullptr);
 }

@@ -11,6 +11,8 @@
 
 namespace zelqo {
 
+class PictureFile;
+
 class Downloader {
  public:
   struct Options {
@@ -41,7 +43,6 @@ class Downloader {
   struct Batch;
   struct Job;
   struct Transfer;
-  struct Saving;
 
   static gboolean pumpCb(gpointer self);
   static gboolean retryCb(gpointer job);
@@ -49,25 +50,17 @@ class Downloader {
   void pump();
   void start(Job job);
   void transferred(Transfer& transfer, const HttpFetch::Outcome& outcome);
-  void save(Transfer& transfer);
-  static void saveInThread(GTask* task, gpointer, gpointer saving, GCancellable*);
-  static void savedCb(GObject*, GAsyncResult* result, gpointer);
-  void saved(Transfer& transfer, const Saving& saving);
-  Job take(Transfer& transfer);
-  void failed(const Job& job, int error, const std::string& reason);
   void retryLater(Job job);
   static void report(const Job& job, int error, const char* path);
 
   const Options _options;
   SessionOwner _session;
   std::list<Job> _waiting;
-  std::list<Transfer> _active;  ///< fetched, then saved
-  int _fetching = 0;
+  std::list<Transfer> _active;
   std::list<Job> _pausing;  ///< each with its timer
   std::set<std::string> _cleaned;
   unsigned int _lastRequest = 0;
   guint _pump = 0;
-  std::shared_ptr<Downloader*> _self;  ///< what is saved may be there when this is long gone
 };
 
 }  // namespace zelqo

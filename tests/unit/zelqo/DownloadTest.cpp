@@ -1,7 +1,5 @@
-#include <dlfcn.h>
 #include <glib/gstdio.h>
 #include <gtest/gtest.h>
-#include <unistd.h>
 #include <utime.h>
 #include <zelqo.h>
 #include <zelqo/Account.h>
@@ -10,7 +8,6 @@
 #include <cstdlib>
 #include <filesystem>
 #include <memory>
-#include <mutex>
 #include <optional>
 #include <utility>
 #include <vector>
@@ -24,10 +21,6 @@
 namespace {
 
 const std::string kPng = "\x89PNG\r\n\x1a\n and the rest of it";
-
-/// Held by whoever wants the disk to hang.
-std::mutex disk;
-bool isMainOnDisk = false;
 
 struct Arrival {
   int error;
@@ -65,9 +58,6 @@ class Download : public testing::Test {
   bool arrived(std::size_t count) {
     return waitUntil([&] { return _arrivals.size() >= count; });
   }
-  bool isBeingSaved() const {
-    return waitUntil([this] { return filesInFolder().size() == 1; });
-  }
   std::vector<std::string> filesInFolder() const {
     std::vector<std::string> names;
     for (const auto& entry : std::filesystem::directory_iterator(_folder.path())) {
@@ -80,22 +70,6 @@ class Download : public testing::Test {
   std::vector<Arrival> _arrivals;
   std::function<void()> _whenArrived;
 };
-
-}  // namespace
-
-/// In place of the system's: a picture gets its name when the disk does not hang.
-extern "C" int rename(const char* from, const char* to) noexcept {
-  static const auto next =
-      reinterpret_cast<int (*)(const char*, const char*)>(dlsym(RTLD_NEXT, "rename"));
-  if (gettid() == getpid()) {
-    isMainOnDisk = true;
-    return next(from, to);
-  }
-  const std::lock_guard<std::mutex> turn(disk);
-  return next(from, to);
-}
-
-namespace {
 
 TEST_F(Download, BringsAWholePicture) {
   FakeServer server(
@@ -337,33 +311,6 @@ TEST_F(Download, EndsWithItsDownloader) {
   runPending();
   EXPECT_TRUE(_arrivals.empty());
   EXPECT_TRUE(filesInFolder().empty());
-}
-
-TEST_F(Download, KeepsTheMainThreadFromTheDisk) {
-  FakeServer server(
-      [](SoupServerMessage* message, const std::string&) { answerWith(message, 200, kPng); });
-  std::unique_lock<std::mutex> hanging(disk);
-  isMainOnDisk = false;
-  ASSERT_EQ(request({server.url("/0")}), 0);
-  ASSERT_TRUE(isBeingSaved());
-  EXPECT_TRUE(_arrivals.empty());
-  hanging.unlock();
-  ASSERT_TRUE(arrived(1));
-  EXPECT_FALSE(isMainOnDisk);
-}
-
-TEST_F(Download, MayEndWhileAPictureIsSaved) {
-  FakeServer server(
-      [](SoupServerMessage* message, const std::string&) { answerWith(message, 200, kPng); });
-  std::unique_lock<std::mutex> hanging(disk);
-  auto downloader = std::make_unique<zelqo::Downloader>(hasty());
-  requestFrom(*downloader, {server.url("/0")});
-  ASSERT_TRUE(isBeingSaved());
-  downloader.reset();
-  hanging.unlock();
-  ASSERT_TRUE(waitUntil([this] { return filesInFolder().at(0).front() != '.'; }));
-  runPending();
-  EXPECT_TRUE(_arrivals.empty());
 }
 
 TEST_F(Download, ClearsAwayWhatAnEarlierProcessLeft) {
