@@ -333,6 +333,8 @@ void ZQVFullView::_showCurrentPage() {
   // With snapping on, the pager would move by one page only.
   elm_scroller_page_snap_set(_grid.get(), EINA_FALSE, EINA_FALSE);
   elm_gengrid_item_show(cell, ELM_GENGRID_ITEM_SCROLLTO_NONE);
+  // The toolkit goes there after the next frame otherwise, which shows another page then.
+  evas_smart_objects_calculate(evas_object_evas_get(_grid.get()));
 }
 
 void ZQVFullView::_createTitleIcon(Elm_Object_Item* item) {
