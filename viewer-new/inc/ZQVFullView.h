@@ -82,6 +82,7 @@ class ZQVFullView : public app_assist::WContentViewController {
   ZQViewerThumbnailItem* _markedItem = nullptr;
   int32_t _currentPage = -1;
   Eina_Bool _isMirrored = EINA_FALSE;
+  bool _isFitted = false;
   bool _isWifiOnly = false;
   ZQVUnableOpenFilePopup* _unablePopup = nullptr;
   ZQVWifiSelectPopup* _wifiPopup = nullptr;

@@ -4,6 +4,8 @@
 #include <app_control.h>
 #include <system_settings.h>
 
+#include <utility>
+
 #include "ZQVAccess.h"
 #include "ZQVCommon.h"
 #include "ZQVDownloadMgr.h"
@@ -320,6 +322,10 @@ void ZQVFullView::_fitPages() {
   if (!zqvFitPages(_grid.get())) return;
   _isMirrored = elm_object_mirrored_get(_grid.get());
   _showCurrentPage();
+  if (!std::exchange(_isFitted, true)) {
+    // The toolkit goes there after the first frame otherwise, which shows another page then.
+    evas_smart_objects_calculate(evas_object_evas_get(_grid.get()));
+  }
   _delayer.start(kSettleTime, [this] { return _delayerSetSize(this); });
 }
 
@@ -333,8 +339,6 @@ void ZQVFullView::_showCurrentPage() {
   // With snapping on, the pager would move by one page only.
   elm_scroller_page_snap_set(_grid.get(), EINA_FALSE, EINA_FALSE);
   elm_gengrid_item_show(cell, ELM_GENGRID_ITEM_SCROLLTO_NONE);
-  // The toolkit goes there after the next frame otherwise, which shows another page then.
-  evas_smart_objects_calculate(evas_object_evas_get(_grid.get()));
 }
 
 void ZQVFullView::_createTitleIcon(Elm_Object_Item* item) {
