@@ -23,17 +23,18 @@
 namespace {
 
 /// A file type's number is its position here; callers read ranges of it, and the first entry that
-/// begins with the extension is taken. So the order matters.
+/// begins with the extension is taken. So the order matters. The last is never compared with one.
 constexpr const char* kExtensions[] = {
-    "mpeg", "mpg", "mp4",  "m4v",  "3gp",  "3gpp", "3g2",  "3gpp2", "mkv",  "webm",  "ts",   "avi",
-    "ram",  "rm",  "rmvb", "wmv",  "asf",  "divx", "flv",  "tp",    "trp",  "m2ts",  "mts",  "m2t",
-    "smi",  "mp3", "mpga", "m4a",  "wav",  "amr",  "awb",  "3ga",   "wma",  "qcp",   "evc",  "pva",
-    "aac",  "pyv", "dm",   "ogg",  "oga",  "mka",  "mid",  "midi",  "xmf",  "rtttl", "smf",  "imy",
-    "rtx",  "ota", "mxmf", "m3u",  "pls",  "wpl",  "m3u8", "fl",    "flac", "jpeg",  "jpg",  "png",
-    "bmp",  "gif", "agif", "webp", "wbmp", "ppt",  "pptx", "doc",   "docx", "xls",   "xlsx", "hwp",
-    "gul",  "pdf", "txt",  "html", "htm",  "vcf",  "vcs",  "vts"};
+    "mpeg", "mpg",   "mp4",  "m4v",    "3gp",  "3gpp", "3g2",  "3gpp2", "mkv",  "webm", "ts",
+    "avi",  "ram",   "rm",   "rmvb",   "wmv",  "asf",  "divx", "flv",   "tp",   "trp",  "m2ts",
+    "mts",  "m2t",   "smi",  "mp3",    "mpga", "m4a",  "wav",  "amr",   "awb",  "3ga",  "wma",
+    "qcp",  "evc",   "pva",  "aac",    "pyv",  "dm",   "ogg",  "oga",   "mka",  "mid",  "midi",
+    "xmf",  "rtttl", "smf",  "imy",    "rtx",  "ota",  "mxmf", "m3u",   "pls",  "wpl",  "m3u8",
+    "fl",   "flac",  "jpeg", "jpg",    "png",  "bmp",  "gif",  "agif",  "webp", "wbmp", "ppt",
+    "pptx", "doc",   "docx", "xls",    "xlsx", "hwp",  "gul",  "pdf",   "txt",  "html", "htm",
+    "vcf",  "vcs",   "vts",  "invalid"};
 constexpr int kUnknownType = 80;
-static_assert(G_N_ELEMENTS(kExtensions) == kUnknownType);
+static_assert(G_N_ELEMENTS(kExtensions) == kUnknownType + 1);
 
 constexpr size_t kTextBuffer = 513;
 
