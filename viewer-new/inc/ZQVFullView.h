@@ -54,7 +54,6 @@ class ZQVFullView : public app_assist::WContentViewController {
   static void _keyCb(void* data, Evas* canvas, Evas_Object* window, void* info);
   void _fitPages();
   Elm_Object_Item* _currentCell() const;
-  void _showCurrentPage();
   void _createTitleIcon(Elm_Object_Item* item);
   void _showTitleIcon(const char** frames);
   void _updateDownloadedStatus();
@@ -82,7 +81,6 @@ class ZQVFullView : public app_assist::WContentViewController {
   ZQViewerThumbnailItem* _markedItem = nullptr;
   int32_t _currentPage = -1;
   Eina_Bool _isMirrored = EINA_FALSE;
-  bool _isFitted = false;
   bool _isWifiOnly = false;
   ZQVUnableOpenFilePopup* _unablePopup = nullptr;
   ZQVWifiSelectPopup* _wifiPopup = nullptr;

@@ -4,8 +4,6 @@
 #include <app_control.h>
 #include <system_settings.h>
 
-#include <utility>
-
 #include "ZQVAccess.h"
 #include "ZQVCommon.h"
 #include "ZQVDownloadMgr.h"
@@ -112,7 +110,6 @@ void ZQVFullView::onCreated() {
   evas_object_data_set(_grid.get(), ZQVFullCell::kOpening, _passedItem);
   _curItem = _passedItem;
   _currentPage = _passedItem->index;
-  _showCurrentPage();
 }
 
 Elm_Object_Item* ZQVFullView::onPushToNaviframe(Evas_Object* naviframe) {
@@ -321,24 +318,14 @@ void ZQVFullView::_keyCb(void* data, Evas*, Evas_Object* window, void* info) {
 void ZQVFullView::_fitPages() {
   if (!zqvFitPages(_grid.get())) return;
   _isMirrored = elm_object_mirrored_get(_grid.get());
-  _showCurrentPage();
-  if (!std::exchange(_isFitted, true)) {
-    // The toolkit goes there after the first frame otherwise, which shows another page then.
-    evas_smart_objects_calculate(evas_object_evas_get(_grid.get()));
-  }
+  // With snapping on, the pager would move by one page only.
+  elm_scroller_page_snap_set(_grid.get(), EINA_FALSE, EINA_FALSE);
+  zqvShowPage(_grid.get(), _currentPage);
   _delayer.start(kSettleTime, [this] { return _delayerSetSize(this); });
 }
 
 Elm_Object_Item* ZQVFullView::_currentCell() const {
   return _curItem ? _curItem->gridItems[_grid.getViewType()] : nullptr;
-}
-
-void ZQVFullView::_showCurrentPage() {
-  Elm_Object_Item* cell = _currentCell();
-  if (!cell) return;
-  // With snapping on, the pager would move by one page only.
-  elm_scroller_page_snap_set(_grid.get(), EINA_FALSE, EINA_FALSE);
-  elm_gengrid_item_show(cell, ELM_GENGRID_ITEM_SCROLLTO_NONE);
 }
 
 void ZQVFullView::_createTitleIcon(Elm_Object_Item* item) {

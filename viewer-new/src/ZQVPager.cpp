@@ -5,8 +5,7 @@ namespace {
 // Places count from the left. A mirrored gengrid puts its first cell to the right, but whether the
 // toolkit's own page numbers follow depends on when it was mirrored; places can be relied on.
 int mirroredIfSo(Evas_Object* pager, int page) {
-  int last = 0;
-  elm_scroller_last_page_get(pager, &last, nullptr);
+  const int last = static_cast<int>(elm_gengrid_items_count(pager)) - 1;
   return elm_object_mirrored_get(pager) ? last - page : page;
 }
 
