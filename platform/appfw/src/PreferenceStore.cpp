@@ -26,7 +26,7 @@ bool isKey(const std::string& key) {
 
 PreferenceStore::PreferenceStore(const std::string& appId)
     : _usable(!base::applicationFolder(appId).empty()),
-      _store(base::applicationFolder(appId) + "data/.pref.db") {}
+      _store(base::applicationFolder(appId) + "data/.pref.db", Store::Reads::OfOneTurn) {}
 
 int PreferenceStore::setText(const std::string& key, const std::string& value) {
   if (!isKey(key) || value.size() > kMaxBytes) return PREFERENCE_ERROR_INVALID_PARAMETER;

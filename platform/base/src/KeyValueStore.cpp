@@ -6,6 +6,8 @@
 #include <dlog.h>
 #include <unistd.h>
 
+#include <utility>
+
 namespace base {
 namespace {
 
@@ -22,9 +24,12 @@ std::string folderOf(const std::string& path) {
 
 }  // namespace
 
-KeyValueStore::KeyValueStore(std::string path) : _path(std::move(path)) {}
+KeyValueStore::KeyValueStore(std::string path, Reads reads)
+    : _path(std::move(path)), _reads(reads) {}
 
-KeyValueStore::~KeyValueStore() = default;
+KeyValueStore::~KeyValueStore() {
+  endTurn();
+}
 
 int KeyValueStore::connect(bool create) {
   if (_connection) return SQLITE_OK;
@@ -63,20 +68,47 @@ KeyValueStore::Answer KeyValueStore::run(bool create, Operation operation) {
   return Answer::Failed;
 }
 
+void KeyValueStore::beginTurn(StoreConnection& connection) {
+  // Who is not called by the loop may just have heard of a change, and its turn would never end.
+  const bool isCalledByLoop = g_main_depth() > 0;
+  if (!isCalledByLoop) endTurn();
+  if (!isCalledByLoop || _turn || _reads == Reads::Fresh) return;
+  connection.beginReading();
+  _turn = g_idle_add_full(G_PRIORITY_HIGH, turnEndedCb, this, nullptr);
+}
+
+void KeyValueStore::endTurn() {
+  if (!_turn) return;
+  g_source_remove(std::exchange(_turn, 0));
+  if (_connection) _connection->endReading();
+}
+
+int KeyValueStore::turnEndedCb(void* self) {
+  auto* store = static_cast<KeyValueStore*>(self);
+  store->endTurn();
+  return G_SOURCE_REMOVE;
+}
+
 KeyValueStore::Answer KeyValueStore::get(const std::string& key, Value& value) {
-  return run(false, [&](StoreConnection& store) { return store.get(key, value); });
+  return run(false, [&](StoreConnection& store) {
+    beginTurn(store);
+    return store.get(key, value);
+  });
 }
 
 KeyValueStore::Answer KeyValueStore::set(const std::string& key, const Value& value) {
+  endTurn();
   const Answer answer = run(true, [&](StoreConnection& store) { return store.set(key, value); });
   return answer == Answer::NoKey ? Answer::Done : answer;
 }
 
 KeyValueStore::Answer KeyValueStore::remove(const std::string& key) {
+  endTurn();
   return run(false, [&](StoreConnection& store) { return store.remove(key); });
 }
 
 KeyValueStore::Answer KeyValueStore::removeAll() {
+  endTurn();
   const Answer answer = run(false, [](StoreConnection& store) { return store.removeAll(); });
   return answer == Answer::NoKey ? Answer::Done : answer;
 }

@@ -74,6 +74,14 @@ int StoreConnection::prepareAll() {
   return SQLITE_OK;
 }
 
+void StoreConnection::beginReading() {
+  execute("BEGIN");
+}
+
+void StoreConnection::endReading() {
+  if (!sqlite3_get_autocommit(_db.get())) execute("COMMIT");
+}
+
 int StoreConnection::get(const std::string& key, KeyValueStore::Value& value) {
   Use use(_get.get());
   use.bind(1, key);

@@ -18,6 +18,11 @@ class StoreConnection {
 
   int open(const std::string& path, bool create);
 
+  /// Until endReading(), every get() answers from what the file held at the first of them.
+  void beginReading();
+  /// Does nothing when nothing was begun.
+  void endReading();
+
   /// SQLITE_ROW when there is such a key, else SQLITE_DONE.
   int get(const std::string& key, KeyValueStore::Value& value);
   int set(const std::string& key, const KeyValueStore::Value& value);

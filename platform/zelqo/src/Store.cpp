@@ -83,6 +83,8 @@ bool readReceived(Database& database, const std::string& token,
 }
 
 bool readFiles(Database& database, const std::string& token, std::vector<ReceivedFile>& files) {
+  Statement count = database.prepare("SELECT count(*) FROM received_file WHERE token = ?");
+  if (count.bind(token).step()) files.reserve(static_cast<std::size_t>(count.number(0)));
   Statement rows = database.prepare(
       "SELECT name, size, type, url, thumb, mid, big FROM received_file WHERE token = ? "
       "ORDER BY position");
@@ -265,7 +267,8 @@ std::optional<ReceivedShare> Store::received(const std::string& token) {
     return readReceived(database, token, share) &&
            (!share || readFiles(database, token, share->files));
   });
-  return done ? share : std::nullopt;
+  if (!done) share.reset();
+  return share;
 }
 
 std::optional<SentShare> Store::sent(std::int64_t requestId) {
@@ -276,7 +279,8 @@ std::optional<SentShare> Store::sent(std::int64_t requestId) {
            (!share || (readTexts(database, kRecipients, requestId, share->recipients) &&
                        readTexts(database, kPaths, requestId, share->paths)));
   });
-  return done ? share : std::nullopt;
+  if (!done) share.reset();
+  return share;
 }
 
 std::vector<ShareSummary> Store::list() {

@@ -2,11 +2,13 @@
 
 #include <app_preference.h>
 #include <appfw/PreferenceStore.h>
+#include <glib.h>
 #include <sqlite3.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <filesystem>
+#include <functional>
 #include <vector>
 
 using appfw::PreferenceStore;
@@ -40,6 +42,30 @@ int exitStatus(pid_t child) {
   int status = -1;
   waitpid(child, &status, 0);
   return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+std::string textOf(PreferenceStore& store, const std::string& key) {
+  std::string text;
+  store.getText(key, text);
+  return text;
+}
+
+/// Runs the code in a callback of the main loop, with whatever was waiting for its next turn
+/// before.
+void inCallback(std::function<void()> code) {
+  bool isDone = false;
+  std::function<void()> both = [&] {
+    code();
+    isDone = true;
+  };
+  g_timeout_add(
+      0,
+      [](gpointer data) -> gboolean {
+        (*static_cast<std::function<void()>*>(data))();
+        return G_SOURCE_REMOVE;
+      },
+      &both);
+  while (!isDone) g_main_context_iteration(nullptr, TRUE);
 }
 
 }  // namespace
@@ -151,6 +177,39 @@ TEST(PreferenceStores, SeeAtOnceWhatAnotherProcessWrote) {
       exitStatus(inProcess([] { return PreferenceStore("test.shared").setText("k", "its"); })), 0);
   EXPECT_EQ(store.getText("k", value), PREFERENCE_ERROR_NONE);
   EXPECT_EQ(value, "its");
+}
+
+TEST(PreferenceStores, AnswerEachCallbackOfTheLoopFromOneState) {
+  PreferenceStore store("com.example.turns"), other("com.example.turns");
+  ASSERT_EQ(other.setText("k", "before"), PREFERENCE_ERROR_NONE);
+  inCallback([&] {
+    EXPECT_EQ(textOf(store, "k"), "before");
+    ASSERT_EQ(other.setText("k", "after"), PREFERENCE_ERROR_NONE);
+    EXPECT_EQ(textOf(store, "k"), "before");
+  });
+  inCallback([&] { EXPECT_EQ(textOf(store, "k"), "after"); });
+}
+
+TEST(PreferenceStores, SeeTheirOwnWritesInTheSameCallback) {
+  PreferenceStore store("com.example.turns"), other("com.example.turns");
+  ASSERT_EQ(store.setText("k", "before"), PREFERENCE_ERROR_NONE);
+  inCallback([&] {
+    EXPECT_EQ(textOf(store, "k"), "before");
+    ASSERT_EQ(other.setText("l", "theirs"), PREFERENCE_ERROR_NONE);
+    ASSERT_EQ(store.setText("k", "after"), PREFERENCE_ERROR_NONE);
+    EXPECT_EQ(textOf(store, "k"), "after");
+    EXPECT_EQ(textOf(store, "l"), "theirs");
+  });
+}
+
+TEST(PreferenceStores, AnswerWhomTheLoopDidNotCallFromWhatThereIs) {
+  PreferenceStore store("com.example.turns"), other("com.example.turns");
+  ASSERT_EQ(other.setText("k", "before"), PREFERENCE_ERROR_NONE);
+  inCallback([&] {
+    EXPECT_EQ(textOf(store, "k"), "before");
+    ASSERT_EQ(other.setText("k", "after"), PREFERENCE_ERROR_NONE);
+  });
+  EXPECT_EQ(textOf(store, "k"), "after");
 }
 
 TEST(PreferenceStores, MakeNoFileForReading) {

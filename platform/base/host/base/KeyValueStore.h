@@ -1,5 +1,5 @@
 /// A persistent key-value store, shared by processes: one SQLite file. Any bytes without a zero are
-/// a key. Calls are synchronous and wait at most half a second for another process.
+/// a key. Calls are synchronous and wait at most half a second for another process. For one thread.
 #pragma once
 
 #include <cstdint>
@@ -17,8 +17,15 @@ class KeyValueStore {
   using Value = std::variant<std::string, int64_t>;
   enum class Answer { Done, NoKey, Failed };
 
+  enum class Reads {
+    Fresh,  ///< what the file holds at the call
+    /// What the file held at the first of the reads that one callback of the main loop makes, or
+    /// after a write of its own: half the time, for a store whose only writer reads it.
+    OfOneTurn,
+  };
+
   /// The file and its folder are made by the first write.
-  explicit KeyValueStore(std::string path);
+  explicit KeyValueStore(std::string path, Reads reads = Reads::Fresh);
   ~KeyValueStore();
   KeyValueStore(const KeyValueStore&) = delete;
   KeyValueStore& operator=(const KeyValueStore&) = delete;
@@ -35,8 +42,13 @@ class KeyValueStore {
   Answer run(bool create, Operation operation);
   int connect(bool create);
   bool moveAsideIfDamaged();
+  void beginTurn(StoreConnection& connection);
+  void endTurn();
+  static int turnEndedCb(void* self);
 
   const std::string _path;
+  const Reads _reads;
+  unsigned _turn = 0;  ///< the source that ends it
   std::unique_ptr<StoreConnection> _connection;
 };
 
