@@ -31,8 +31,9 @@ constexpr std::array<EntryPath, 3> kEntryPaths{{
 
 const char* entryPathOf(const char* caller, int entry) {
   for (const EntryPath& path : kEntryPaths) {
-    if (g_strcmp0(caller, path.caller) == 0)
+    if (g_strcmp0(caller, path.caller) == 0) {
       return entry == ZQV_ENTRY_SENT ? path.sent : path.received;
+    }
   }
   return "Push_notification";
 }
