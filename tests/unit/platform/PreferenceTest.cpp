@@ -153,6 +153,7 @@ TEST_F(Preferences, StopListingWhenToldSo) {
 TEST(PreferenceStores, LoseNothingWithManyWritersThatMakeTheFileTogether) {
   constexpr int writers = 6, each = 200;
   std::vector<pid_t> children;
+  children.reserve(writers);
   for (int writer = 0; writer < writers; writer++) {
     children.push_back(inProcess([writer] {
       PreferenceStore store("test.crowd");
