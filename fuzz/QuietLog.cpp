@@ -10,6 +10,7 @@ int dlog_print(log_priority, const char*, const char* format, ...) {
   char line[4096];
   va_list values;
   va_start(values, format);
+  // NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized): va_start is not seen as one
   const int length = vsnprintf(line, sizeof line, format, values);
   va_end(values);
   return length;

@@ -62,6 +62,7 @@ void readByViewer(app_control_h request) {
   launch.requestId();
   const auto files = launch.files();
   std::vector<const char*> paths;
+  paths.reserve(files.size());
   for (const auto& file : files) paths.push_back(file.get());
   Eina_List* items = nullptr;
   uint64_t totalSize = 0;

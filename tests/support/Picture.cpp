@@ -44,7 +44,7 @@ std::ostream& operator<<(std::ostream& out, const Colour& colour) {
 
 std::string makePicture(const Phone& phone, const std::string& name, const Colour& colour,
                         int width, int height) {
-  const std::string path = phone.makeFile(name, 0);
+  std::string path = phone.makeFile(name, 0);
   const Picture picture(gdk_pixbuf_new(GDK_COLORSPACE_RGB, FALSE, kBitsPerSample, width, height));
   gdk_pixbuf_fill(picture.get(), static_cast<guint32>(colour.red) << 24 |
                                      static_cast<guint32>(colour.green) << 16 |
@@ -58,7 +58,7 @@ std::string makeStripes(const Phone& phone, const std::string& name) {
   constexpr int kWidth = 4000;
   constexpr int kHeight = 3000;
   constexpr int kPeriod = 13;
-  const std::string path = phone.makeFile(name, 0);
+  std::string path = phone.makeFile(name, 0);
   const Picture picture(gdk_pixbuf_new(GDK_COLORSPACE_RGB, FALSE, kBitsPerSample, kWidth, kHeight));
   gdk_pixbuf_fill(picture.get(), 0xffffffff);
   for (int x = 0; x + kPeriod <= kWidth; x += kPeriod) {
@@ -70,7 +70,7 @@ std::string makeStripes(const Phone& phone, const std::string& name) {
 }
 
 std::string makeAnimation(const Phone& phone, const std::string& name) {
-  const std::string path = phone.makeFile(name, 0);
+  std::string path = phone.makeFile(name, 0);
   const bool isGif = endsWith(name, ".gif");
   const std::string frames = std::string(
                                  "color=red:s=400x300:r=2:d=1[red];"
@@ -112,8 +112,8 @@ std::string pixelsOf(const Phone& phone, const Area& area) {
     return {};
   }
   const int perPixel = gdk_pixbuf_get_n_channels(screen.get());
-  const guchar* row = gdk_pixbuf_read_pixels(screen.get()) + area.x * perPixel +
-                      area.y * gdk_pixbuf_get_rowstride(screen.get());
+  const guchar* row = gdk_pixbuf_read_pixels(screen.get()) + ptrdiff_t{area.x} * perPixel +
+                      ptrdiff_t{area.y} * gdk_pixbuf_get_rowstride(screen.get());
   std::string pixels;
   for (int y = 0; y < area.height; y++, row += gdk_pixbuf_get_rowstride(screen.get())) {
     pixels.append(reinterpret_cast<const char*>(row),

@@ -24,7 +24,7 @@ char** environmentWith(const Words& additions) {
 }
 
 std::string take(char* text) {
-  const std::string result = text ? text : "";
+  std::string result = text ? text : "";
   g_free(text);
   return result;
 }

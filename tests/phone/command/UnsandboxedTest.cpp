@@ -47,9 +47,9 @@ TEST(UnsandboxedPhone, IsTheOnlyOne) {
   if (!canHaveOne()) GTEST_SKIP() << kRoot << " belongs to this machine";
   const Phone phone("unsandboxed", {}, kNoSandbox);
   ASSERT_TRUE(phone.isUp());
-  const Output output = phone::run(
-      {SOURCE_DIR "/phone/phone", "--state", phone.folder() + "-two", "up", "--headless"},
-      kNoSandbox);
+  const std::string command = SOURCE_DIR "/phone/phone";
+  const Output output =
+      phone::run({command, "--state", phone.folder() + "-two", "up", "--headless"}, kNoSandbox);
   EXPECT_EQ(output.status, 1);
   EXPECT_NE(output.err.find("one phone at a time"), std::string::npos) << output.err;
 }

@@ -78,7 +78,7 @@ class FailingCalls : public testing::Test {
     };
     _watch.begin();
     EXPECT_TRUE(journey.go(_watch, hasGoneFarEnough)) << "the viewer hangs";
-    const Words calls = counted();
+    Words calls = counted();
     setting.lift();
     if (isEnough || !endsAfterRecall()) expectGoodHealth(journey);
     EXPECT_LE(_watch.longestWait().count(), kLongestWait.count());

@@ -59,7 +59,7 @@ TEST_F(BadRequest, WithoutATokenIsLogged) {
 }
 
 TEST_F(BadRequest, WithHugeTextsIsSurvived) {
-  const std::string huge(64 * 1024, 'x');
+  const std::string huge(64UL * 1024, 'x');
   expectLoggedAndSurvived({"launch", "raw", kLaunchViewer, "view_type=received",
                            "contents_token=" + huge, "other=" + huge},
                           "E/");
@@ -83,7 +83,7 @@ TEST_F(BadRequest, WithInvalidUtf8IsSurvived) {
 namespace {
 
 std::string manifest(const std::string& json) {
-  const std::string file = thePhone().makeFile("manifest.json", 0);
+  std::string file = thePhone().makeFile("manifest.json", 0);
   std::ofstream(file) << json;
   return file;
 }

@@ -18,7 +18,7 @@ constexpr const char* kSender = "+821011112222";
 Words files(int count) {
   Words names;
   for (int i = 1; i <= count; i++) {
-    names.push_back(thePhone().makeFile("File " + std::to_string(i) + ".txt", 100 * i));
+    names.push_back(thePhone().makeFile("File " + std::to_string(i) + ".txt", 100UL * i));
   }
   return names;
 }

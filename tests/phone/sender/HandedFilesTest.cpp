@@ -1,10 +1,7 @@
 // Files that another application hands over with its launch request.
 
-#include <filesystem>
-
 #include "Screen.h"
 
-namespace fs = std::filesystem;
 using phone::thePhone;
 using phone::Tree;
 using phone::Words;

@@ -36,8 +36,8 @@ Pixels pixelsOf(const std::string& name) {
   Pixels pixels{gdk_pixbuf_get_width(withAlpha.get()), gdk_pixbuf_get_height(withAlpha.get()), {}};
   const guchar* rows = gdk_pixbuf_read_pixels(withAlpha.get());
   for (int y = 0; y < pixels.height; ++y) {
-    const guchar* row = rows + y * gdk_pixbuf_get_rowstride(withAlpha.get());
-    pixels.values.insert(pixels.values.end(), row, row + pixels.width * 4);
+    const guchar* row = rows + ptrdiff_t{y} * gdk_pixbuf_get_rowstride(withAlpha.get());
+    pixels.values.insert(pixels.values.end(), row, row + ptrdiff_t{pixels.width} * 4);
   }
   return pixels;
 }
@@ -63,6 +63,7 @@ const std::array kVideoLayers{"video_play", "video_bg", "video_ef"};
 
 std::vector<std::string> frames(const std::string& prefix) {
   std::vector<std::string> names;
+  names.reserve(7);
   for (int frame = 0; frame < 7; ++frame) {
     names.push_back("zq_ic_download_progress/" + prefix + "0" + std::to_string(frame) + ".png");
   }

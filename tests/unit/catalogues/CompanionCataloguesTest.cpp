@@ -24,6 +24,7 @@ constexpr std::array kLanguages{"en", "de", "fr",    "es", "pt", "ru",
 
 testing::AssertionResult runs(std::vector<std::string> words) {
   std::vector<char*> argv;
+  argv.reserve(words.size() + 1);
   for (auto& word : words) argv.push_back(word.data());
   argv.push_back(nullptr);
   char* said = nullptr;
@@ -58,10 +59,9 @@ TEST_P(CompanionCatalogue, HasEveryTextInEveryLanguage) {
   const std::string texts = testing::TempDir() + application + ".pot";
   ASSERT_TRUE(collectTexts(application, texts));
   for (const char* language : kLanguages) {
-    EXPECT_TRUE(
-        runs({MSGCMP, APPS_BUILD_DIR "/" + application + "/" + application + "." + language + ".po",
-              texts}))
-        << language;
+    const std::string catalogue =
+        std::string(APPS_BUILD_DIR "/").append(application).append("/").append(application);
+    EXPECT_TRUE(runs({MSGCMP, catalogue + "." + language + ".po", texts})) << language;
   }
   fs::remove(texts);
 }

@@ -85,7 +85,7 @@ class TheMediaDatabase : public testing::Test {
     const common::OwnedText hash(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.get(), -1));
     const std::string cache = std::string(g_get_user_cache_dir()) + "/thumbnails/x-large";
     fs::create_directories(cache);
-    const std::string thumbnail = cache + "/" + hash.get() + ".png";
+    std::string thumbnail = cache + "/" + hash.get() + ".png";
     writeFile(thumbnail, "picture");
     return thumbnail;
   }

@@ -229,6 +229,7 @@ TEST_F(Contacts, MergesTheNewsOfManyChanges) {
   ASSERT_EQ(contacts_db_add_changed_cb(_contacts_person._uri, Count::changed, &count),
             CONTACTS_ERROR_NONE);
   std::vector<AddressBookEditor::Entry> entries;
+  entries.reserve(kMany);
   for (int i = 0; i < kMany; i++) entries.push_back({"A", {"+" + std::to_string(1000 + i)}, ""});
   add(entries);
   EXPECT_TRUE(waitFor([&] { return byNumber("+1").size() == kMany && count.calls > 0; }));

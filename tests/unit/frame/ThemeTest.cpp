@@ -115,8 +115,9 @@ void expectParts(const std::string& file, const Group& group) {
   const Drawn drawn(file, group.name);
   ASSERT_TRUE(drawn.loaded) << "no group " << group.name;
   std::istringstream parts(group.parts);
-  for (std::string part; parts >> part;)
+  for (std::string part; parts >> part;) {
     EXPECT_TRUE(edje_object_part_exists(drawn.object, part.c_str())) << part;
+  }
 }
 
 std::string itemOf(const std::string& file, const std::string& group, const char* key) {

@@ -56,7 +56,7 @@ class PictureGate : public ViewerTest {
   void TearDown() override { std::filesystem::remove_all(folder); }
 
   std::string file(const std::string& content) const {
-    const std::string path = folder + "/picture";
+    std::string path = folder + "/picture";
     std::ofstream(path, std::ios::binary) << content;
     return path;
   }

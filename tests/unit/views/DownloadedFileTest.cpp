@@ -52,7 +52,7 @@ class MayBeOpened : public PhoneTest {
     EXPECT_EQ(system(command.c_str()), 0);
   }
   std::string file(const std::string& name, const std::string& content, mode_t mode = 0600) {
-    const std::string path = _folder + "/" + name;
+    std::string path = _folder + "/" + name;
     std::ofstream(path, std::ios::binary) << content;
     chmod(path.c_str(), mode);
     return path;

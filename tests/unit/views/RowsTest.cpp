@@ -16,7 +16,7 @@ class Rows : public ViewTest {
 
   std::string text(app_assist::WGenlistItem& row, const char* part) {
     char* text = row.getItemClass()->func.text_get(&row, list, part);
-    const std::string copy = text ? text : "(null)";
+    std::string copy = text ? text : "(null)";
     free(text);
     return copy;
   }

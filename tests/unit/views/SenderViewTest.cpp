@@ -41,7 +41,7 @@ class SenderView : public ViewTest {
   std::string rowText(Elm_Object_Item* row) const {
     const Elm_Genlist_Item_Class* rowClass = elm_genlist_item_item_class_get(row);
     char* text = rowClass->func.text_get(elm_object_item_data_get(row), list, "elm.text.main");
-    const std::string copy = text ? text : "(null)";
+    std::string copy = text ? text : "(null)";
     free(text);
     return copy;
   }

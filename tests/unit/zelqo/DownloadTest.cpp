@@ -41,6 +41,7 @@ class Download : public testing::Test {
 
   int request(const std::vector<std::string>& urls) {
     std::vector<const char*> texts;
+    texts.reserve(urls.size());
     for (const std::string& url : urls) texts.push_back(url.c_str());
     return zelqo_request_download(texts.data(), static_cast<unsigned int>(texts.size()),
                                   _folder.path().c_str(), 1, 0, arrivedCb, this);

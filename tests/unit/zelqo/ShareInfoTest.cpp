@@ -11,7 +11,7 @@
 namespace {
 
 std::string taken(char* text) {
-  const std::string copy = text ? text : "(null)";
+  std::string copy = text ? text : "(null)";
   free(text);
   return copy;
 }

@@ -40,8 +40,8 @@ std::string sizeText(unsigned long long bytes) {
   const bool isBig = bytes >= kMegabyte;
   const double size = static_cast<double>(bytes) / (isBig ? kMegabyte : kKilobyte);
   const common::OwnedText line(bytes < kKilobyte
-                                 ? g_strdup_printf("%llu B", bytes)
-                                 : g_strdup_printf("%.1f %s", size, isBig ? "MB" : "KB"));
+                                   ? g_strdup_printf("%llu B", bytes)
+                                   : g_strdup_printf("%.1f %s", size, isBig ? "MB" : "KB"));
   return line.get();
 }
 

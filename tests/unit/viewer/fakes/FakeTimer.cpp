@@ -50,6 +50,7 @@ int FakeClock::running() {
 }
 
 ZQVTimer::~ZQVTimer() {
+  if (_gone) *_gone = true;
   stop();
 }
 

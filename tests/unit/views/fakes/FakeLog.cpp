@@ -57,6 +57,7 @@ extern "C" int dlog_print(log_priority priority, const char*, const char* format
   va_start(values, format);
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Wformat-nonliteral"
+  // NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized): va_start is not seen as one
   const int length = vsnprintf(line, sizeof line, format, values);
 #pragma GCC diagnostic pop
   va_end(values);
