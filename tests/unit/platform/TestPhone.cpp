@@ -145,7 +145,7 @@ void writeFile(const std::string& path, const std::string& contents) {
 }
 
 std::string take(char* text) {
-  const std::string copy = text ? text : "(null)";
+  std::string copy = text ? text : "(null)";
   free(text);
   return copy;
 }

@@ -15,7 +15,7 @@ namespace {
 std::string text(app_control_h request, const char* key) {
   char* value = nullptr;
   app_control_get_extra_data(request, key, &value);
-  const std::string copy = value ? value : "";
+  std::string copy = value ? value : "";
   free(value);
   return copy;
 }

@@ -130,7 +130,9 @@ TEST_F(OrderOfSignals, LeavesStatusAndButtonAsTheRulesSay) {
     const bool enabled = isDownloadEnabled(view);
     naviframe.destroyAllViewControllers();
     RC_ASSERT(arrived);
-    for (size_t i = 0; i < statuses.size(); ++i) RC_ASSERT(files[i].downloadStatus == statuses[i]);
+    for (size_t i = 0; i < statuses.size(); ++i) {
+      RC_ASSERT(files[i].downloadStatus == statuses[i]);
+    }
     RC_ASSERT(enabled == any);
   }));
 }
