@@ -249,7 +249,7 @@ def _fetch_by_viewer(subject, token, count):
 
 def _fetch_by_client(subject, addresses):
     target = subject.path("opt-usr/media/fetched")
-    shutil.rmtree(target, ignore_errors=True)
+    subject.put_away(target)
     os.makedirs(target)
     with open(os.path.join(target, "config"), "w", encoding="utf-8") as file:
         for number, address in enumerate(addresses):

@@ -126,13 +126,16 @@ class Subject:
                              [(file[kind], picture) for file, picture in zip(files, pictures)
                               for kind in ("thumb", "mid")])
 
+    def put_away(self, folder):
+        """A file system may be slow, for minutes, to make files where many have been deleted."""
+        away = tempfile.mkdtemp(dir=self.path("opt-usr"))
+        with contextlib.suppress(FileNotFoundError):
+            os.rename(folder, os.path.join(away, "was"))
+
     def forget_thumbnails(self, keys):
         """Nothing of them is on the phone any more."""
-        # A file system may be slow to make new files where many have just been deleted.
-        away = tempfile.mkdtemp(dir=self.path("opt-usr"))
         for name in ("thumbnail", "fullview_thumbnail"):
-            with contextlib.suppress(FileNotFoundError):
-                os.rename(self.path(SHARED, name), os.path.join(away, name))
+            self.put_away(self.path(SHARED, name))
         with contextlib.closing(self._preferences()) as base, base:
             base.executemany("DELETE FROM pref WHERE k = ?", [(key,) for key in keys])
 

@@ -69,10 +69,23 @@ class Contacts : public ::testing::Test {
 
   void SetUp() override { ASSERT_EQ(contacts_connect(), CONTACTS_ERROR_NONE); }
 
+  /// Returns when the service knows that there is nobody, for the next test asks it.
   void TearDown() override {
-    contacts_disconnect();
+    contacts_disconnect();  // and the test's callbacks are gone
     std::string error;
     for (const auto& entry : editor().all()) editor().remove(entry.name, error);
+    ASSERT_EQ(contacts_connect(), CONTACTS_ERROR_NONE);
+    EXPECT_TRUE(waitFor([] { return everybody() == 0; }));
+    contacts_disconnect();
+  }
+
+  static int everybody() {
+    contacts_list_h list = nullptr;
+    int count = -1;
+    contacts_db_get_all_records(_contacts_person._uri, 0, 0, &list);
+    contacts_list_get_count(list, &count);
+    contacts_list_destroy(list, true);
+    return count;
   }
 
   static AddressBookEditor& editor() {
