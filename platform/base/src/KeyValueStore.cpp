@@ -84,38 +84,45 @@ void KeyValueStore::endTurn() {
 }
 
 int KeyValueStore::turnEndedCb(void* self) {
-  auto* store = static_cast<KeyValueStore*>(self);
-  store->endTurn();
+  static_cast<KeyValueStore*>(self)->endTurn();
   return G_SOURCE_REMOVE;
 }
 
-KeyValueStore::Answer KeyValueStore::get(const std::string& key, Value& value) {
+template <typename Operation>
+KeyValueStore::Answer KeyValueStore::read(Operation operation) {
   return run(false, [&](StoreConnection& store) {
     beginTurn(store);
-    return store.get(key, value);
+    return operation(store);
   });
 }
 
-KeyValueStore::Answer KeyValueStore::set(const std::string& key, const Value& value) {
+template <typename Operation>
+KeyValueStore::Answer KeyValueStore::write(bool create, Operation operation) {
   endTurn();
-  const Answer answer = run(true, [&](StoreConnection& store) { return store.set(key, value); });
+  return run(create, operation);
+}
+
+KeyValueStore::Answer KeyValueStore::get(const std::string& key, Value& value) {
+  return read([&](StoreConnection& store) { return store.get(key, value); });
+}
+
+KeyValueStore::Answer KeyValueStore::set(const std::string& key, const Value& value) {
+  const Answer answer = write(true, [&](StoreConnection& store) { return store.set(key, value); });
   return answer == Answer::NoKey ? Answer::Done : answer;
 }
 
 KeyValueStore::Answer KeyValueStore::remove(const std::string& key) {
-  endTurn();
-  return run(false, [&](StoreConnection& store) { return store.remove(key); });
+  return write(false, [&](StoreConnection& store) { return store.remove(key); });
 }
 
 KeyValueStore::Answer KeyValueStore::removeAll() {
-  endTurn();
-  const Answer answer = run(false, [](StoreConnection& store) { return store.removeAll(); });
+  const Answer answer = write(false, [](StoreConnection& store) { return store.removeAll(); });
   return answer == Answer::NoKey ? Answer::Done : answer;
 }
 
 KeyValueStore::Answer KeyValueStore::keys(std::vector<std::string>& keys) {
   keys.clear();
-  const Answer answer = run(false, [&](StoreConnection& store) { return store.keys(keys); });
+  const Answer answer = read([&](StoreConnection& store) { return store.keys(keys); });
   return answer == Answer::NoKey ? Answer::Done : answer;
 }
 

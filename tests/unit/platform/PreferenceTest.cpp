@@ -68,6 +68,22 @@ void inCallback(std::function<void()> code) {
   while (!isDone) g_main_context_iteration(nullptr, TRUE);
 }
 
+/// What one application reads while another connection writes.
+class TurnsOfTheLoop : public testing::Test {
+ protected:
+  TurnsOfTheLoop() {
+    EXPECT_EQ(other.removeAll(), PREFERENCE_ERROR_NONE);
+    EXPECT_EQ(other.setText("k", "before"), PREFERENCE_ERROR_NONE);
+  }
+  void readAndLetItChange() {
+    EXPECT_EQ(textOf(store, "k"), "before");
+    ASSERT_EQ(other.setText("k", "after"), PREFERENCE_ERROR_NONE);
+  }
+
+  PreferenceStore store{"com.example.turns"};
+  PreferenceStore other{"com.example.turns"};
+};
+
 }  // namespace
 
 TEST_F(Preferences, TakeAnyTextAsKey) {
@@ -180,37 +196,36 @@ TEST(PreferenceStores, SeeAtOnceWhatAnotherProcessWrote) {
   EXPECT_EQ(value, "its");
 }
 
-TEST(PreferenceStores, AnswerEachCallbackOfTheLoopFromOneState) {
-  PreferenceStore store("com.example.turns"), other("com.example.turns");
-  ASSERT_EQ(other.setText("k", "before"), PREFERENCE_ERROR_NONE);
-  inCallback([&] {
-    EXPECT_EQ(textOf(store, "k"), "before");
-    ASSERT_EQ(other.setText("k", "after"), PREFERENCE_ERROR_NONE);
+TEST_F(TurnsOfTheLoop, AreAnsweredFromOneStateEach) {
+  inCallback([this] {
+    readAndLetItChange();
     EXPECT_EQ(textOf(store, "k"), "before");
   });
-  inCallback([&] { EXPECT_EQ(textOf(store, "k"), "after"); });
+  inCallback([this] { EXPECT_EQ(textOf(store, "k"), "after"); });
 }
 
-TEST(PreferenceStores, SeeTheirOwnWritesInTheSameCallback) {
-  PreferenceStore store("com.example.turns"), other("com.example.turns");
-  ASSERT_EQ(store.setText("k", "before"), PREFERENCE_ERROR_NONE);
-  inCallback([&] {
-    EXPECT_EQ(textOf(store, "k"), "before");
-    ASSERT_EQ(other.setText("l", "theirs"), PREFERENCE_ERROR_NONE);
-    ASSERT_EQ(store.setText("k", "after"), PREFERENCE_ERROR_NONE);
+TEST_F(TurnsOfTheLoop, SeeTheirOwnWrites) {
+  inCallback([this] {
+    readAndLetItChange();
+    ASSERT_EQ(store.setText("l", "mine"), PREFERENCE_ERROR_NONE);
+    EXPECT_EQ(textOf(store, "l"), "mine");
     EXPECT_EQ(textOf(store, "k"), "after");
-    EXPECT_EQ(textOf(store, "l"), "theirs");
   });
 }
 
-TEST(PreferenceStores, AnswerWhomTheLoopDidNotCallFromWhatThereIs) {
-  PreferenceStore store("com.example.turns"), other("com.example.turns");
-  ASSERT_EQ(other.setText("k", "before"), PREFERENCE_ERROR_NONE);
-  inCallback([&] {
-    EXPECT_EQ(textOf(store, "k"), "before");
-    ASSERT_EQ(other.setText("k", "after"), PREFERENCE_ERROR_NONE);
-  });
+TEST_F(TurnsOfTheLoop, EndForWhomTheLoopDidNotCall) {
+  inCallback([this] { readAndLetItChange(); });
   EXPECT_EQ(textOf(store, "k"), "after");
+}
+
+TEST_F(TurnsOfTheLoop, EndForWhoListsTheKeysToo) {
+  inCallback([this] {
+    readAndLetItChange();
+    ASSERT_EQ(other.setText("l", "new"), PREFERENCE_ERROR_NONE);
+  });
+  std::vector<std::string> keys;
+  EXPECT_EQ(store.keys(keys), PREFERENCE_ERROR_NONE);
+  EXPECT_EQ(keys, (std::vector<std::string>{"k", "l"}));
 }
 
 TEST(PreferenceStores, MakeNoFileForReading) {

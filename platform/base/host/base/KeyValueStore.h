@@ -20,7 +20,7 @@ class KeyValueStore {
   enum class Reads {
     Fresh,  ///< what the file holds at the call
     /// What the file held at the first of the reads that one callback of the main loop makes, or
-    /// after a write of its own: half the time, for a store whose only writer reads it.
+    /// after a write of this store. A read that shares its transaction takes half the time.
     OfOneTurn,
   };
 
@@ -40,6 +40,10 @@ class KeyValueStore {
  private:
   template <typename Operation>
   Answer run(bool create, Operation operation);
+  template <typename Operation>
+  Answer read(Operation operation);
+  template <typename Operation>
+  Answer write(bool create, Operation operation);
   int connect(bool create);
   bool moveAsideIfDamaged();
   void beginTurn(StoreConnection& connection);
