@@ -127,7 +127,7 @@ class Subject:
                               for kind in ("thumb", "mid")])
 
     def put_away(self, folder):
-        """A file system may be slow, for minutes, to make files where many have been deleted."""
+        """Instead of deleting it, after which a file system may be slow to make files for minutes."""
         away = tempfile.mkdtemp(dir=self.path("opt-usr"))
         with contextlib.suppress(FileNotFoundError):
             os.rename(folder, os.path.join(away, "was"))
