@@ -1,5 +1,6 @@
 #include "app_assist/WViewController.h"
 
+#include "ClipRecords.h"
 #include "ViewPrivate.h"
 
 namespace app_assist {
@@ -55,6 +56,7 @@ WWindowController* WViewController::getWindowController() const {
 void WViewController::Private::viewDeletedCb(void* data, Evas*, Evas_Object* view, void*) {
   auto* self = static_cast<WViewController*>(data);
   self->_v->view = nullptr;
+  ownClipRecords(view);
   self->onViewDeleted(view);
 }
 

@@ -1,25 +1,20 @@
 #include "WidgetWalk.h"
 
 namespace app_assist {
-namespace {
 
-using See = std::function<bool(Evas_Object*, const char*)>;
-
-void walk(Evas_Object* object, const See& see) {
+void walkWithin(Evas_Object* object, const See& see) {
   const char* type = evas_object_type_get(object);
   if (!type || !see(object, type) || !efl_isa(object, EFL_CANVAS_GROUP_CLASS)) return;
   Eina_List* members = evas_object_smart_members_get(object);
   while (members) {
-    walk(static_cast<Evas_Object*>(eina_list_data_get(members)), see);
+    walkWithin(static_cast<Evas_Object*>(eina_list_data_get(members)), see);
     members = eina_list_remove_list(members, members);
   }
 }
 
-}  // namespace
-
 void walkWidgets(Evas_Object* window, const See& see) {
   Evas_Object* object = evas_object_bottom_get(evas_object_evas_get(window));
-  for (; object; object = evas_object_above_get(object)) walk(object, see);
+  for (; object; object = evas_object_above_get(object)) walkWithin(object, see);
 }
 
 }  // namespace app_assist

@@ -7,8 +7,11 @@
 
 namespace app_assist {
 
-/// `see` gets each object with the name of its type, and says whether what is inside matters, too.
-void walkWidgets(Evas_Object* window,
-                 const std::function<bool(Evas_Object* object, const char* type)>& see);
+/// Gets each object with the name of its type, and says whether what is inside matters, too.
+using See = std::function<bool(Evas_Object* object, const char* type)>;
+
+void walkWidgets(Evas_Object* window, const See& see);
+/// The object itself, and what is in it.
+void walkWithin(Evas_Object* object, const See& see);
 
 }  // namespace app_assist

@@ -1,6 +1,25 @@
+#include <malloc.h>
+
 #include "FramePages.h"
 
 using Naviframe = FrameTest;
+
+namespace {
+
+constexpr int kLayouts = 200;
+
+/// As many layouts as a grid's page has in some launches.
+class CrowdedPage : public FakePage {
+ public:
+  using FakePage::FakePage;
+  Evas_Object* onCreateView(Evas_Object* parent, void*) override {
+    Evas_Object* box = elm_box_add(parent);
+    for (int i = 0; i < kLayouts; i++) elm_box_pack_end(box, elm_layout_add(box));
+    return box;
+  }
+};
+
+}  // namespace
 
 TEST_F(Naviframe, BuildsAPageInOrder) {
   pushedJustNow("a");
@@ -25,6 +44,27 @@ TEST_F(Naviframe, ShowsATitleThatIsSetLater) {
   EXPECT_STREQ(elm_object_item_text_get(page->getNaviItem()), "Later");
   page->setTitle(nullptr);
   EXPECT_STREQ(page->getTitle(), "");
+}
+
+TEST_F(Naviframe, LeavesNothingOfTheLayoutsOfAPage) {
+#ifdef __SANITIZE_ADDRESS__
+  GTEST_SKIP() << "the sanitizer's memory is not counted";
+#endif
+  constexpr size_t rounds = 4;
+  const auto usedAfterPages = [this] {
+    for (size_t i = 0; i < rounds; i++) {
+      record.clear();
+      naviframe->push(new CrowdedPage(record, "a"));
+      passLoop();
+      naviframe->destroyAllViewControllers();
+      EXPECT_TRUE(has("a gone"));
+      runPastTransitions();
+    }
+    return mallinfo2().uordblks;
+  };
+  usedAfterPages();
+  const size_t before = usedAfterPages();
+  EXPECT_LT(usedAfterPages(), before + rounds * kLayouts * 16);
 }
 
 TEST_F(Naviframe, DestroysAPageThatCannotBeCreated) {
