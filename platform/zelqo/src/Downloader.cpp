@@ -19,6 +19,25 @@ std::string nameInLog(const std::string& url) {
   return std::string(escaped.get()) + (url.size() > shown ? "…" : "");
 }
 
+struct Kept {
+  int error = ZELQO_ERROR_NONE;
+  std::string path;
+  std::string reason;
+};
+
+Kept keep(PictureFile& file, const HttpFetch::Outcome& outcome) {
+  if (outcome.error != ZELQO_ERROR_NONE) return {outcome.error, {}, outcome.reason};
+  switch (file.finish()) {
+    case PictureFile::Result::Whole:
+      return {ZELQO_ERROR_NONE, file.path(), {}};
+    case PictureFile::Result::NoPicture:
+      return {ZELQO_ERROR_REFUSED, {}, "not a picture"};
+    case PictureFile::Result::Failed:
+      break;
+  }
+  return {ZELQO_ERROR_STORE, {}, "it cannot be kept"};
+}
+
 }  // namespace
 
 struct Downloader::Batch {
@@ -31,7 +50,7 @@ struct Downloader::Job {
   std::shared_ptr<Batch> batch;
   std::size_t index;
   int attempts = 0;
-  guint timer = 0;
+  SourceOwner timer;
   Downloader* owner = nullptr;
 
   const std::string& url() const { return batch->order.urls[index]; }
@@ -46,15 +65,7 @@ struct Downloader::Transfer {
 Downloader::Downloader(const Options& options)
     : _options(options), _session(makeSession(options.connections, options.inactivityS)) {}
 
-Downloader::~Downloader() {
-  if (_pump) g_source_remove(_pump);
-  for (const Job& job : _pausing) g_source_remove(job.timer);
-}
-
-Downloader& Downloader::instance() {
-  static Downloader downloader{Options()};
-  return downloader;
-}
+Downloader::~Downloader() = default;
 
 void Downloader::add(Order order) {
   if (_cleaned.insert(order.folder).second) PictureFile::removeLeftovers(order.folder);
@@ -65,12 +76,12 @@ void Downloader::add(Order order) {
 }
 
 void Downloader::schedulePump() {
-  if (!_pump) _pump = g_idle_add_full(G_PRIORITY_DEFAULT, pumpCb, this, nullptr);
+  if (!_pump) _pump = callSoon(pumpCb, this);
 }
 
 gboolean Downloader::pumpCb(gpointer self) {
   auto* downloader = static_cast<Downloader*>(self);
-  downloader->_pump = 0;
+  downloader->_pump.reset();
   downloader->pump();
   return G_SOURCE_REMOVE;
 }
@@ -88,7 +99,7 @@ void Downloader::start(Job job) {
       job.url().size() <= kMaxAddress ? makeMessage(SOUP_METHOD_GET, job.url()) : nullptr;
   if (!message) {
     g_warning("zelqo: not an address to fetch from: %s", nameInLog(job.url()).c_str());
-    report(job, ZELQO_ERROR_INVALID_PARAMETER, nullptr);
+    report(job, ZELQO_ERROR_INVALID_PARAMETER);
     return;
   }
   Transfer& transfer = _active.emplace_back();
@@ -103,33 +114,19 @@ void Downloader::start(Job job) {
 }
 
 void Downloader::transferred(Transfer& transfer, const HttpFetch::Outcome& outcome) {
+  const Kept kept = keep(*transfer.file, outcome);
   Job job = std::move(transfer.job);
-  const std::unique_ptr<PictureFile> file = std::move(transfer.file);
+  // Whoever is told finds nothing left of what is not whole.
   _active.remove_if([&transfer](const Transfer& other) { return &other == &transfer; });
   schedulePump();
-
-  int error = outcome.error;
-  std::string reason = outcome.reason;
-  if (error == ZELQO_ERROR_NONE) {
-    switch (file->finish()) {
-      case PictureFile::Result::Whole:
-        report(job, ZELQO_ERROR_NONE, file->path().c_str());
-        return;
-      case PictureFile::Result::NoPicture:
-        error = ZELQO_ERROR_REFUSED;
-        reason = "not a picture";
-        break;
-      case PictureFile::Result::Failed:
-        error = ZELQO_ERROR_STORE;
-        break;
-    }
-  }
   if (outcome.transient() && job.attempts < _options.retries) {
     retryLater(std::move(job));
     return;
   }
-  g_warning("zelqo: %s was not fetched: %s", nameInLog(job.url()).c_str(), reason.c_str());
-  report(job, error, nullptr);
+  if (kept.error != ZELQO_ERROR_NONE) {
+    g_warning("zelqo: %s was not fetched: %s", nameInLog(job.url()).c_str(), kept.reason.c_str());
+  }
+  report(job, kept.error, kept.path);
 }
 
 void Downloader::retryLater(Job job) {
@@ -137,11 +134,12 @@ void Downloader::retryLater(Job job) {
   Job& pausing = _pausing.emplace_back(std::move(job));
   pausing.attempts++;
   pausing.owner = this;
-  pausing.timer = g_timeout_add(pause, retryCb, &pausing);
+  pausing.timer = callAfter(pause, retryCb, &pausing);
 }
 
 gboolean Downloader::retryCb(gpointer data) {
   auto* job = static_cast<Job*>(data);
+  job->timer.reset();
   Downloader* downloader = job->owner;
   downloader->_waiting.push_back(std::move(*job));
   downloader->_pausing.remove_if([job](const Job& other) { return &other == job; });
@@ -149,12 +147,12 @@ gboolean Downloader::retryCb(gpointer data) {
   return G_SOURCE_REMOVE;
 }
 
-// Last in whatever calls it: the callback may order more.
-void Downloader::report(const Job& job, int error, const char* path) {
+// Last in whatever calls it: who is told may order more.
+void Downloader::report(const Job& job, int error, const std::string& path) {
   Batch& batch = *job.batch;
   batch.remaining--;
-  batch.order.callback(batch.requestId, error, path, job.url().c_str(),
-                       static_cast<unsigned int>(batch.remaining), batch.order.userData);
+  batch.order.report(
+      {batch.requestId, error, path, job.url(), static_cast<unsigned int>(batch.remaining)});
 }
 
 }  // namespace zelqo

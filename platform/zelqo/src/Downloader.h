@@ -1,12 +1,14 @@
 /// Fetches pictures: a queue, a few at a time, again after a break when it looks worth it.
 #pragma once
 
+#include <functional>
 #include <list>
 #include <set>
 #include <string>
 #include <vector>
 
 #include "HttpFetch.h"
+#include "Loop.h"
 #include "zelqo.h"
 
 namespace zelqo {
@@ -22,11 +24,18 @@ class Downloader {
     int retries = 3;
     guint firstPauseMs = 500;  ///< doubles with every retry
   };
+  /// What has become of one address of an order.
+  struct Report {
+    unsigned int requestId;
+    int error;
+    std::string path;  ///< of the picture; empty with an error
+    std::string url;
+    unsigned int remaining;
+  };
   struct Order {
     std::vector<std::string> urls;
     std::string folder;
-    zelqo_download_cb callback = nullptr;
-    void* userData = nullptr;
+    std::function<void(const Report&)> report;
   };
 
   explicit Downloader(const Options& options);
@@ -34,9 +43,7 @@ class Downloader {
   Downloader(const Downloader&) = delete;
   Downloader& operator=(const Downloader&) = delete;
 
-  static Downloader& instance();
-
-  /// Callbacks come later, from the main loop.
+  /// Reports come later, from the main loop of the calling thread.
   void add(Order order);
 
  private:
@@ -51,7 +58,7 @@ class Downloader {
   void start(Job job);
   void transferred(Transfer& transfer, const HttpFetch::Outcome& outcome);
   void retryLater(Job job);
-  static void report(const Job& job, int error, const char* path);
+  static void report(const Job& job, int error, const std::string& path = {});
 
   const Options _options;
   SessionOwner _session;
@@ -60,7 +67,7 @@ class Downloader {
   std::list<Job> _pausing;  ///< each with its timer
   std::set<std::string> _cleaned;
   unsigned int _lastRequest = 0;
-  guint _pump = 0;
+  SourceOwner _pump;
 };
 
 }  // namespace zelqo

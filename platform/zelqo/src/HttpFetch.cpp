@@ -31,22 +31,21 @@ HttpFetch::HttpFetch(SoupSession* session, MessageOwner message, Limits limits, 
       _limits(limits),
       _sink(std::move(sink)),
       _done(std::move(done)),
-      _self(std::make_shared<HttpFetch*>(this)),
+      _loan(new Loan{this, std::unique_ptr<char[]>(new char[kPiece])}),
       _cancellable(g_cancellable_new()),
-      _deadline(g_timeout_add(limits.deadlineMs, deadlineCb, this)) {
+      _deadline(callAfter(limits.deadlineMs, deadlineCb, this)) {
   soup_session_send_async(session, _message.get(), G_PRIORITY_DEFAULT, _cancellable.get(), sentCb,
                           lend());
 }
 
 HttpFetch::~HttpFetch() {
-  *_self = nullptr;
-  if (_deadline) g_source_remove(_deadline);
+  _loan->fetch = nullptr;
   g_cancellable_cancel(_cancellable.get());
 }
 
 HttpFetch* HttpFetch::claim(gpointer data) {
-  const std::unique_ptr<Self> self(static_cast<Self*>(data));
-  return **self;
+  const std::unique_ptr<std::shared_ptr<Loan>> loan(static_cast<std::shared_ptr<Loan>*>(data));
+  return (*loan)->fetch;
 }
 
 void HttpFetch::sentCb(GObject* session, GAsyncResult* result, gpointer data) {
@@ -64,26 +63,24 @@ void HttpFetch::sentCb(GObject* session, GAsyncResult* result, gpointer data) {
 }
 
 void HttpFetch::readMore() {
-  g_input_stream_read_bytes_async(_stream.get(), kPiece, G_PRIORITY_DEFAULT, _cancellable.get(),
-                                  readCb, lend());
+  g_input_stream_read_async(_stream.get(), _loan->piece.get(), kPiece, G_PRIORITY_DEFAULT,
+                            _cancellable.get(), readCb, lend());
 }
 
 void HttpFetch::readCb(GObject* stream, GAsyncResult* result, gpointer data) {
   common::OwnedError error;
-  const common::Owned<GBytes, g_bytes_unref> bytes(
-      g_input_stream_read_bytes_finish(G_INPUT_STREAM(stream), result, common::Out(error)));
+  const gssize size =
+      g_input_stream_read_finish(G_INPUT_STREAM(stream), result, common::Out(error));
   HttpFetch* fetch = claim(data);
   if (!fetch) return;
-  if (!bytes) {
+  if (size < 0) {
     fetch->finish(ZELQO_ERROR_NETWORK, error ? error->message : "the answer broke off");
   } else {
-    fetch->take(bytes.get());
+    fetch->take(static_cast<gsize>(size));
   }
 }
 
-void HttpFetch::take(GBytes* bytes) {
-  gsize size = 0;
-  const auto* data = static_cast<const char*>(g_bytes_get_data(bytes, &size));
+void HttpFetch::take(gsize size) {
   if (size == 0) {
     finish(statusError(), soup_message_get_reason_phrase(_message.get()));
     return;
@@ -91,7 +88,7 @@ void HttpFetch::take(GBytes* bytes) {
   _received += static_cast<goffset>(size);
   if (_received > _limits.size) {
     finish(ZELQO_ERROR_REFUSED, "the answer is too long");
-  } else if (!_sink(soup_message_get_status(_message.get()), data, size)) {
+  } else if (!_sink(soup_message_get_status(_message.get()), _loan->piece.get(), size)) {
     finish(ZELQO_ERROR_STORE, "the answer cannot be kept");
   } else {
     readMore();
@@ -108,14 +105,13 @@ zelqo_error_e HttpFetch::statusError() const {
 
 gboolean HttpFetch::deadlineCb(gpointer self) {
   auto* fetch = static_cast<HttpFetch*>(self);
-  fetch->_deadline = 0;
   fetch->finish(ZELQO_ERROR_NETWORK, "no whole answer in time");
   return G_SOURCE_REMOVE;
 }
 
 void HttpFetch::finish(zelqo_error_e error, const std::string& reason) {
-  *_self = nullptr;
-  if (_deadline) g_source_remove(std::exchange(_deadline, 0));
+  _loan->fetch = nullptr;
+  _deadline.reset();
   g_cancellable_cancel(_cancellable.get());
   const Outcome outcome{error, soup_message_get_status(_message.get()), reason};
   const Done done = std::move(_done);

@@ -1,4 +1,4 @@
-/// One HTTP request on the main loop, bounded in time and size.
+/// One HTTP request on the main loop of its thread, bounded in time and size.
 #pragma once
 
 #include <libsoup/soup.h>
@@ -9,6 +9,7 @@
 #include <memory>
 #include <string>
 
+#include "Loop.h"
 #include "zelqo.h"
 
 namespace zelqo {
@@ -47,16 +48,19 @@ class HttpFetch {
   SoupMessage* message() const { return _message.get(); }
 
  private:
-  /// What a pending callback is given: it may come when the request is long gone.
-  using Self = std::shared_ptr<HttpFetch*>;
+  /// What a pending call is given: it may end when the request is long gone.
+  struct Loan {
+    HttpFetch* fetch;  ///< null then
+    std::unique_ptr<char[]> piece;
+  };
   static HttpFetch* claim(gpointer data);
-  gpointer lend() const { return new Self(_self); }
+  gpointer lend() const { return new std::shared_ptr<Loan>(_loan); }
 
   static void sentCb(GObject* session, GAsyncResult* result, gpointer data);
   static void readCb(GObject* stream, GAsyncResult* result, gpointer data);
   static gboolean deadlineCb(gpointer self);
   void readMore();
-  void take(GBytes* bytes);
+  void take(gsize size);
   void finish(zelqo_error_e error, const std::string& reason);
   zelqo_error_e statusError() const;
 
@@ -64,11 +68,11 @@ class HttpFetch {
   Limits _limits;
   Sink _sink;
   Done _done;
-  Self _self;
+  std::shared_ptr<Loan> _loan;
   common::Owned<GCancellable, g_object_unref> _cancellable;
   common::Owned<GInputStream, g_object_unref> _stream;
   goffset _received = 0;
-  guint _deadline = 0;
+  SourceOwner _deadline;
 };
 
 }  // namespace zelqo

@@ -3,7 +3,7 @@
 
 #include <utility>
 
-#include "Downloader.h"
+#include "DownloadThread.h"
 #include "transfers.h"
 
 namespace {
@@ -33,8 +33,12 @@ int zelqo_transfer_download(const char** urls, unsigned int count, const char* f
   }
   if (!isWritableFolder(folder)) return ZELQO_ERROR_STORE;
   order.folder = withoutTrailingSlash(folder);
-  order.callback = callback;
-  order.userData = user_data;
-  zelqo::Downloader::instance().add(std::move(order));
+  order.report = [callback, user_data](const zelqo::Downloader::Report& report) {
+    callback(report.requestId, report.error, report.path.empty() ? nullptr : report.path.c_str(),
+             report.url.c_str(), report.remaining, user_data);
+  };
+  zelqo::DownloadThread* const thread = zelqo::DownloadThread::instance();
+  if (!thread) return ZELQO_ERROR_NETWORK;
+  thread->add(std::move(order));
   return ZELQO_ERROR_NONE;
 }

@@ -5,15 +5,19 @@
 #include <zelqo/Account.h>
 
 #include <algorithm>
+#include <chrono>
 #include <cstdlib>
 #include <filesystem>
+#include <future>
 #include <memory>
 #include <optional>
+#include <thread>
 #include <utility>
 #include <vector>
 
 #include "Downloader.h"
 #include "FakeServer.h"
+#include "Loop.h"
 #include "ServiceProcess.h"
 #include "TempFolder.h"
 #include "WaitUntil.h"
@@ -29,10 +33,46 @@ struct Arrival {
   unsigned int remaining;
 };
 
+/// Answers while the test's own main loop rests.
+class ServerInAThread {
+ public:
+  ServerInAThread() : _thread([this] { run(); }) { _url = _ready.get_future().get(); }
+  ~ServerInAThread() {
+    zelqo::runIn(_context, [this] { _ends = true; });
+    _thread.join();
+    g_main_context_unref(_context);
+  }
+  ServerInAThread(const ServerInAThread&) = delete;
+  ServerInAThread& operator=(const ServerInAThread&) = delete;
+
+  const std::string& url() const { return _url; }
+
+ private:
+  void run() {
+    g_main_context_push_thread_default(_context);
+    {
+      const FakeServer server(
+          [](SoupServerMessage* message, const std::string&) { answerWith(message, 200, kPng); });
+      _ready.set_value(server.url("/0"));
+      while (!_ends) g_main_context_iteration(_context, TRUE);
+    }
+    while (g_main_context_iteration(_context, FALSE)) {
+    }
+    g_main_context_pop_thread_default(_context);
+  }
+
+  GMainContext* const _context = g_main_context_new();
+  std::promise<std::string> _ready;
+  std::string _url;
+  bool _ends = false;
+  std::thread _thread;
+};
+
 class Download : public testing::Test {
  protected:
   static int arrivedCb(unsigned int, int error, const char* path, const char* url,
                        unsigned int remaining, void* self) {
+    EXPECT_TRUE(g_main_context_is_owner(nullptr));
     auto* test = static_cast<Download*>(self);
     test->_arrivals.push_back({error, path ? path : "", url, remaining});
     if (test->_whenArrived) test->_whenArrived();
@@ -48,7 +88,10 @@ class Download : public testing::Test {
   }
   /// Requests through a downloader that loses patience quickly.
   void requestFrom(zelqo::Downloader& downloader, const std::vector<std::string>& urls) {
-    downloader.add({urls, _folder.path(), arrivedCb, this});
+    downloader.add(
+        {urls, _folder.path(), [this](const zelqo::Downloader::Report& report) {
+           _arrivals.push_back({report.error, report.path, report.url, report.remaining});
+         }});
   }
   static zelqo::Downloader::Options hasty() {
     zelqo::Downloader::Options options;
@@ -299,6 +342,20 @@ TEST_F(Download, MayBeOrderedFromTheCallback) {
   };
   ASSERT_EQ(request({server.url("/0")}), 0);
   ASSERT_TRUE(arrived(5));
+}
+
+TEST_F(Download, GoesOnWhileTheApplicationIsBusy) {
+  const ServerInAThread server;
+  ASSERT_EQ(request({server.url()}), 0);
+  const auto isThere = [this] {
+    const std::vector<std::string> names = filesInFolder();
+    return !names.empty() && names[0].front() != '.';
+  };
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(20);
+  while (!isThere() && std::chrono::steady_clock::now() < deadline) std::this_thread::yield();
+  EXPECT_TRUE(isThere());
+  EXPECT_TRUE(_arrivals.empty());
+  ASSERT_TRUE(arrived(1));
 }
 
 TEST_F(Download, EndsWithItsDownloader) {
