@@ -1,14 +1,21 @@
 #include <dlog.h>
 
 #include "LogLine.h"
+#include "Repetition.h"
 
 #include <glib.h>
 #include <unistd.h>
 
 #include <cerrno>
+#include <cstdlib>
 #include <memory>
+#include <mutex>
 
 namespace {
+
+using dlog::Repetition;
+
+constexpr size_t kJournalLimit = 4096;
 
 bool writable(log_priority prio) {
   return prio > DLOG_UNKNOWN && prio < DLOG_PRIO_MAX;
@@ -53,6 +60,43 @@ int toStderr(const std::string& line) {
   return written < 0 ? -errno : static_cast<int>(written);
 }
 
+int writeLine(const Repetition::Line& line) {
+  static const bool journal = g_log_writer_is_journald(STDERR_FILENO);
+  const std::string text = dlog::logLine(letter(line.priority), line.tag, getpid(), line.message);
+  return journal && toJournal(line.priority, line.tag.c_str(),
+                              dlog::oneLine(line.message, kJournalLimit).c_str())
+             ? static_cast<int>(text.size())
+             : toStderr(text);
+}
+
+/// What all threads of the process have said last. It outlives whatever might log at its end.
+struct Log {
+  std::mutex mutex;
+  Repetition repetition;
+};
+
+Log& theLog() {
+  static Log& log = *new Log;
+  return log;
+}
+
+void writeCount() {
+  const Repetition::Line count = theLog().repetition.takeCount();
+  if (count.priority != DLOG_UNKNOWN) writeLine(count);
+}
+
+int say(const Repetition::Line& line) {
+  static const int atEnd = atexit(writeCount);
+  static_cast<void>(atEnd);
+  const std::lock_guard<std::mutex> lock(theLog().mutex);
+  const gint64 now = g_get_monotonic_time();
+  Repetition& repetition = theLog().repetition;
+  if (repetition.isOneTooMany(line, now)) return static_cast<int>(line.message.size());
+  writeCount();
+  repetition.written(line, now);
+  return writeLine(line);
+}
+
 }  // namespace
 
 int dlog_vprint(log_priority prio, const char* tag, const char* fmt, va_list ap) {
@@ -61,11 +105,7 @@ int dlog_vprint(log_priority prio, const char* tag, const char* fmt, va_list ap)
   const int savedErrno = errno;  // callers log between a failed call and their look at errno
   std::unique_ptr<char, decltype(&g_free)> message(g_strdup_vprintf(fmt, ap), g_free);
   if (!message) return DLOG_ERROR_INVALID_PARAMETER;
-  static const bool journal = g_log_writer_is_journald(STDERR_FILENO);
-  const std::string line = dlog::logLine(letter(prio), tag, getpid(), message.get());
-  const int written = journal && toJournal(prio, tag, dlog::oneLine(message.get(), 4096).c_str())
-                          ? static_cast<int>(line.size())
-                          : toStderr(line);
+  const int written = say({prio, tag, message.get()});
   errno = savedErrno;
   return written;
 }

@@ -1,14 +1,17 @@
 #include "LogLine.h"
+#include "Repetition.h"
 #include "TestPhone.h"
 
 #include <dlog.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <climits>
 
 using dlog::logLine;
 using dlog::oneLine;
+using dlog::Repetition;
 
 namespace {
 
@@ -115,4 +118,57 @@ TEST(Log, LeavesErrnoAlone) {
     dlog_print(DLOG_ERROR, "T", "x");
     EXPECT_EQ(errno, ENOTDIR);
   });
+}
+
+TEST(Log, CountsWhatIsSaidOverAndOverAndSaysSoBeforeAnythingElse) {
+  const std::string text = stderrOf([] {
+    for (int i = 0; i < 1000; i++) dlog_print(DLOG_ERROR, "T", "%s", "over and over");
+    dlog_print(DLOG_INFO, "T", "something else");
+  });
+  const std::string same = logLine('E', "T", getpid(), "over and over");
+  std::string expected;
+  for (unsigned i = 0; i < Repetition::kWritten; i++) expected += same;
+  expected += logLine('E', "T", getpid(),
+                      "the line before, repeated: " + std::to_string(1000 - Repetition::kWritten));
+  expected += logLine('I', "T", getpid(), "something else");
+  EXPECT_EQ(text, expected);
+}
+
+TEST(Log, WritesEveryLineThatDiffersFromTheOneBefore) {
+  const std::string text = stderrOf([] {
+    for (int i = 0; i < 1000; i++) dlog_print(DLOG_ERROR, "T", "%d", i % 2);
+  });
+  EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 1000);
+}
+
+TEST(Log, SaysAtTheEndOfTheProcessHowOftenTheLastLineCame) {
+  EXPECT_EXIT(
+      {
+        for (int i = 0; i < 100; i++) dlog_print(DLOG_ERROR, "T", "x");
+        exit(0);
+      },
+      testing::ExitedWithCode(0), "the line before, repeated: 84");
+}
+
+TEST(Repetition, IsNoneAfterASecond) {
+  Repetition repetition;
+  const Repetition::Line line{DLOG_ERROR, "T", "x"};
+  for (unsigned i = 0; i < Repetition::kWritten; i++) {
+    EXPECT_FALSE(repetition.isOneTooMany(line, 5));
+    repetition.written(line, 5);
+  }
+  EXPECT_TRUE(repetition.isOneTooMany(line, Repetition::kWindowUs + 4));
+  EXPECT_FALSE(repetition.isOneTooMany(line, Repetition::kWindowUs + 5));
+  EXPECT_EQ(repetition.takeCount().message, "the line before, repeated: 1");
+  EXPECT_EQ(repetition.takeCount().priority, DLOG_UNKNOWN);
+}
+
+TEST(Repetition, TellsPrioritiesTagsAndMessagesApart) {
+  Repetition repetition;
+  const Repetition::Line line{DLOG_ERROR, "T", "x"};
+  for (unsigned i = 0; i < Repetition::kWritten; i++) repetition.written(line, 0);
+  EXPECT_TRUE(repetition.isOneTooMany(line, 0));
+  EXPECT_FALSE(repetition.isOneTooMany({DLOG_WARN, "T", "x"}, 0));
+  EXPECT_FALSE(repetition.isOneTooMany({DLOG_ERROR, "U", "x"}, 0));
+  EXPECT_FALSE(repetition.isOneTooMany({DLOG_ERROR, "T", "y"}, 0));
 }
