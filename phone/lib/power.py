@@ -17,7 +17,8 @@ def up(state, args):
                     flags=("headless",), usage=_UP)
     settings = {
         "screen": _screen(options.get("screen", "720x1280")),
-        "language": locale(options.get("lang", "en_US.UTF-8")),
+        # The phone keeps its language over the night, as it does its theme.
+        "language": locale(options.get("lang") or state.settings().get("language", "en_US.UTF-8")),
         "number": _subscriber(options.get("number", "+821012345678")),
         "service": options.get("service"),
         "while": number(options.get("while", "0"), "--while", 0),

@@ -186,6 +186,7 @@ class Phone:
     def set_language(self, language):
         """For everything that starts from now on."""
         self.language = language
+        self.state.save({**self.state.settings(), "language": language})
         buses.environment(self, environment.language_of(language))
         self.environment.update(environment.language_of(language))
 

@@ -79,6 +79,7 @@ TEST(PhoneDown, LeavesNothingBehindAndKeepsWhatWasStored) {
   ASSERT_TRUE(phone.isUp());
   phone({"prefs", "set", "a key", "a value"});
   phone({"contact", "add", "Mina", "+821055556666"});
+  phone({"language", "de_DE"});
   ASSERT_FALSE(processesOf(phone.folder()).empty());
   phone({"down"});
   EXPECT_TRUE(phone::waitFor([&] { return processesOf(phone.folder()).empty(); }));
@@ -86,6 +87,7 @@ TEST(PhoneDown, LeavesNothingBehindAndKeepsWhatWasStored) {
   phone({"up", "--headless"});
   EXPECT_EQ(phone({"prefs", "get", "a key"}), "a value\n");
   EXPECT_EQ(phone({"contact", "list"}), "Mina\t+821055556666\n");
+  EXPECT_EQ(phone({"shell", "sh", "-c", "echo $LANG"}), "de_DE.UTF-8\n");
 }
 
 /// The phone's processes that were started by this command, as the machine sees them.
