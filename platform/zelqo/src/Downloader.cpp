@@ -50,7 +50,7 @@ struct Downloader::Job {
   std::shared_ptr<Batch> batch;
   std::size_t index;
   int attempts = 0;
-  SourceOwner timer;
+  SourceOwner timer = nullptr;
   Downloader* owner = nullptr;
 
   const std::string& url() const { return batch->order.urls[index]; }
