@@ -15,14 +15,7 @@
 namespace {
 
 bool own(GDBusConnection* bus, const char* name) {
-  common::OwnedError error;
-  const common::OwnedVariant answer(g_dbus_connection_call_sync(
-      bus, "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "RequestName",
-      g_variant_new("(su)", name, 4u /* do not queue */), G_VARIANT_TYPE("(u)"),
-      G_DBUS_CALL_FLAGS_NONE, -1, nullptr, common::Out(error)));
-  guint32 result = 0;
-  if (answer) g_variant_get(answer.get(), "(u)", &result);
-  if (result == 1) return true;
+  if (base::takeName(bus, name)) return true;
   fprintf(stderr, "phone-world: %s is taken\n", name);
   return false;
 }

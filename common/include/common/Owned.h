@@ -4,6 +4,7 @@
 
 #include <gio/gio.h>
 
+#include <cstdlib>
 #include <memory>
 
 namespace common {
@@ -24,6 +25,8 @@ template <typename T>
 using OwnedObject = Owned<T, g_object_unref>;
 
 using OwnedText = Owned<char, g_free>;
+/// Of the platform's and the toolkit's calls that give a text away as malloc made it.
+using OwnedPlainText = Owned<char, std::free>;
 using OwnedTexts = Owned<char*, g_strfreev>;
 using OwnedError = Owned<GError, g_error_free>;
 using OwnedBytes = Owned<GBytes, g_bytes_unref>;

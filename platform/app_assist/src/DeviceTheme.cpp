@@ -3,17 +3,13 @@
 #include <Ecore_X.h>
 #include <Elementary.h>
 #include <dlog.h>
-#include <vconf.h>
 
 #include <base/PhonePaths.h>
 #include <common/Owned.h>
+#include <settings/Look.h>
 
-#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
-#include <cstring>
-
-#include "SettingKeys.h"
 
 namespace app_assist {
 namespace {
@@ -23,10 +19,8 @@ constexpr double kDesignWidth = 720;
 /// Titles keep their size, or they would not fit.
 constexpr const char* kScaledTexts[] = {"caption", "body", "label"};
 
-using OwnedData = common::Owned<char, free>;
-
 std::string themeData(const std::string& key) {
-  const OwnedData value(edje_file_data_get(DeviceTheme::path().c_str(), key.c_str()));
+  const common::OwnedPlainText value(edje_file_data_get(DeviceTheme::path().c_str(), key.c_str()));
   return value ? value.get() : "";
 }
 
@@ -38,13 +32,6 @@ void setColour(const char* name, const char* palette) {
     return;
   }
   edje_color_class_set(name, r, g, b, a, 0, 0, 0, 0, 0, 0, 0, 0);
-}
-
-/// Percent, as the accessibility settings have it.
-int textSize() {
-  int percent = 100;
-  vconf_get_int(kTextSizeKey, &percent);
-  return std::clamp(percent, 80, 200);
 }
 
 void setTextSize(int percent) {
@@ -78,20 +65,19 @@ bool DeviceTheme::install() {
 }
 
 void DeviceTheme::applyPalette() {
-  const common::Owned<char, free> wanted(vconf_get_str(kThemeKey));
-  const char* palette = wanted && strcmp(wanted.get(), "dark") == 0 ? "dark" : "light";
+  const char* palette = settings::isDark() ? "dark" : "light";
   const std::string names = themeData("colours");
   const common::OwnedTexts list(g_strsplit(names.c_str(), " ", -1));
   for (char** name = list.get(); *name; name++) {
     if (**name) setColour(*name, palette);
   }
   // The toolkit takes the colours of a text's style up again only with a new size.
-  setTextSize(textSize() + 1);
+  setTextSize(settings::textSize() + 1);
   applyTextSize();
 }
 
 void DeviceTheme::applyTextSize() {
-  setTextSize(textSize());
+  setTextSize(settings::textSize());
 }
 
 void DeviceTheme::applyScale() {

@@ -20,8 +20,6 @@ extern int _nl_msg_cat_cntr;
 namespace app_assist {
 namespace {
 
-using OwnedPlainText = common::Owned<char, free>;
-
 void bind(const char* domain, const std::string& folder) {
   bindtextdomain(domain, folder.c_str());
   bind_textdomain_codeset(domain, "UTF-8");
@@ -50,7 +48,7 @@ void applyMessagesOnly(const std::string& locale) {
 
 /// That of the settings, else that of the environment.
 std::string wantedLocale() {
-  const OwnedPlainText setting(vconf_get_str(VCONFKEY_LANGSET));
+  const common::OwnedPlainText setting(vconf_get_str(VCONFKEY_LANGSET));
   if (setting && *setting) return setting.get();
   const char* inherited = setlocale(LC_MESSAGES, "");
   return inherited ? inherited : "C.UTF-8";
@@ -72,7 +70,7 @@ void setDirection(const std::string& locale) {
 
 void Language::bindCatalogues() {
   bindFolder(base::phoneRoot() + "/share/locale");
-  const OwnedPlainText resources(app_get_resource_path());
+  const common::OwnedPlainText resources(app_get_resource_path());
   if (resources) bindFolder(std::string(resources.get()) + "locale");
 }
 

@@ -11,8 +11,6 @@
 namespace app_assist {
 namespace {
 
-using OwnedMarkup = common::Owned<char, free>;
-
 const char* nameOf(connection_type_e type) {
   switch (type) {
     case CONNECTION_TYPE_WIFI:
@@ -91,7 +89,7 @@ void StatusStrip::showBattery(int percent) {
 /// The banner has room for all of it; when that has gone, the strip keeps its beginning for a
 /// while.
 void StatusStrip::showMessage(const std::string& text) {
-  const OwnedMarkup markup(evas_textblock_text_utf8_to_markup(nullptr, text.c_str()));
+  const common::OwnedPlainText markup(evas_textblock_text_utf8_to_markup(nullptr, text.c_str()));
   elm_object_part_text_set(_layout, "message", markup.get());
   elm_object_signal_emit(_layout, "message,show", "elm");
   _banner.show(markup.get());

@@ -5,6 +5,7 @@
 #include <appfw/AppId.h>
 #include <appfw/AppService.h>
 #include <dlog.h>
+#include <settings/Look.h>
 #include <unistd.h>
 #include <vconf.h>
 
@@ -19,7 +20,6 @@
 #include "LateDestroyer.h"
 #include "MarkupRefresh.h"
 #include "MemoryUse.h"
-#include "SettingKeys.h"
 #include "Threads.h"
 #include "WindowPrivate.h"
 #include "app_assist/WNaviframeController.h"
@@ -185,8 +185,9 @@ void WApp::Private::followSettings(bool follow) {
   static const struct {
     const char* key;
     vconf_callback_fn callback;
-  } kFollowed[] = {
-      {VCONFKEY_LANGSET, languageCb}, {kThemeKey, paletteCb}, {kTextSizeKey, textSizeCb}};
+  } kFollowed[] = {{VCONFKEY_LANGSET, languageCb},
+                   {settings::kThemeKey, paletteCb},
+                   {settings::kTextSizeKey, textSizeCb}};
   for (const auto& entry : kFollowed) {
     if (follow) {
       vconf_notify_key_changed(entry.key, entry.callback, this);

@@ -44,6 +44,19 @@ common::OwnedVariant ask(GDBusConnection* bus, const Question& question, GError*
   return answer;
 }
 
+bool takeName(GDBusConnection* bus, const char* name) {
+  constexpr guint32 doNotQueue = 4;
+  constexpr guint32 owner = 1;
+  // Asked at the start of a program, which is nothing without its name.
+  constexpr std::chrono::seconds patience(5);
+  const common::OwnedVariant answer(
+      ask(bus, {kBusName, "/org/freedesktop/DBus", kBusName, "RequestName",
+                g_variant_new("(su)", name, doNotQueue), "(u)", patience}));
+  guint32 result = 0;
+  if (answer) g_variant_get(answer.get(), "(u)", &result);
+  return result == owner;
+}
+
 BusReturn::BusReturn(BusKind kind, std::function<void()> returned)
     : _kind(kind), _id(BusKeeper::of(kind).onReturn(std::move(returned))) {}
 

@@ -1,5 +1,6 @@
 #include "ContactsService.h"
 
+#include <base/Bus.h>
 #include <dlog.h>
 
 namespace contacts {
@@ -34,25 +35,13 @@ bool ContactsService::start() {
   OwnedError error;
   _object = g_dbus_connection_register_object(_bus, kServicePath, serviceInterface(), &calls, this,
                                               nullptr, Out(error));
-  if (!_object || !_takeName()) {
+  if (!_object || !base::takeName(_bus, kServiceName)) {
     dlog_print(DLOG_ERROR, "CONTACTS", "the contacts service cannot be reached by others");
     return false;
   }
   // Whoever knew the service before it ended knows less than it does now.
   _tellChange();
   return true;
-}
-
-bool ContactsService::_takeName() {
-  constexpr guint doNotQueue = 4;
-  constexpr guint owner = 1;
-  const OwnedVariant answer(g_dbus_connection_call_sync(
-      _bus, "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "RequestName",
-      g_variant_new("(su)", kServiceName, doNotQueue), G_VARIANT_TYPE("(u)"),
-      G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
-  guint result = 0;
-  if (answer) g_variant_get(answer.get(), "(u)", &result);
-  return result == owner;
 }
 
 void ContactsService::_tellChange() {

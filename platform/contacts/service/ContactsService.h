@@ -23,7 +23,6 @@ class ContactsService {
   static void _methodCb(GDBusConnection*, const char*, const char*, const char*, const char*,
                         GVariant*, GDBusMethodInvocation* invocation, gpointer self);
 
-  bool _takeName();
   void _tellChange();
 
   GDBusConnection* const _bus;

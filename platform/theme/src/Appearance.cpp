@@ -2,27 +2,14 @@
 
 #include <Edje.h>
 #include <common/Owned.h>
+#include <settings/Look.h>
 #include <vconf.h>
-
-#include <algorithm>
-#include <cstdlib>
-#include <cstring>
 
 namespace theme {
 namespace {
 
-constexpr const char* kThemeKey = "db/setting/theme";
-constexpr const char* kTextSizeKey = "db/setting/accessibility/font_size";
-
 Style currentStyle() {
-  const common::Owned<char, free> name(vconf_get_str(kThemeKey));
-  return name && strcmp(name.get(), "dark") == 0 ? Style::Dark : Style::Light;
-}
-
-int currentTextSize() {
-  int percent = 100;
-  vconf_get_int(kTextSizeKey, &percent);
-  return std::clamp(percent, 80, 200);
+  return settings::isDark() ? Style::Dark : Style::Light;
 }
 
 bool setColour(Evas_Object* object, const std::string& code) {
@@ -93,9 +80,9 @@ void Appearance::follow() {
   if (_following) return;
   _following = true;
   vconf_notify_key_changed(
-      kThemeKey, [](keynode_t*, void*) { instance().applyColours(); }, nullptr);
+      settings::kThemeKey, [](keynode_t*, void*) { instance().applyColours(); }, nullptr);
   vconf_notify_key_changed(
-      kTextSizeKey, [](keynode_t*, void*) { instance().applyFonts(); }, nullptr);
+      settings::kTextSizeKey, [](keynode_t*, void*) { instance().applyFonts(); }, nullptr);
 }
 
 void Appearance::applyColours() {
@@ -111,7 +98,7 @@ void Appearance::applyColours() {
 void Appearance::applyFonts() {
   if (!_fonts) return;
   for (const auto& [code, font] : _fonts->fonts()) {
-    edje_text_class_set(code.c_str(), font.name.c_str(), font.size * currentTextSize() / 100);
+    edje_text_class_set(code.c_str(), font.name.c_str(), font.size * settings::textSize() / 100);
   }
 }
 

@@ -9,7 +9,7 @@ namespace zelqo {
 namespace {
 
 std::string setting(const char* key) {
-  const common::Owned<char, std::free> text(vconf_get_str(key));
+  const common::OwnedPlainText text(vconf_get_str(key));
   return text ? text.get() : "";
 }
 

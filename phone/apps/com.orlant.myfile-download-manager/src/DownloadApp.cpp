@@ -23,7 +23,7 @@ constexpr const char* kViewer = "com.orlant.zelqo";
 constexpr const char* kFileManager = "com.orlant.myfile-lite";
 
 DownloadManager::Folders folders() {
-  const common::Owned<char, std::free> data(app_get_data_path());
+  const common::OwnedPlainText data(app_get_data_path());
   return {base::phoneRoot() + "/media/Downloads", std::string(data.get()) + "queue.db",
           base::applicationFolder(kFileManager) + "shared/data/zelqo/zelqo.json"};
 }

@@ -14,13 +14,12 @@ namespace {
 
 constexpr unsigned int kIdleSeconds = 30;
 
-using OwnedText = common::Owned<char, std::free>;
 using OwnedRequest = common::Owned<std::remove_pointer_t<app_control_h>, app_control_destroy>;
 
 std::string pathOf(app_control_h request) {
   char* raw = nullptr;
   app_control_get_uri(request, &raw);
-  const OwnedText uri(raw);
+  const common::OwnedPlainText uri(raw);
   return uri ? mime::pathOfUri(uri.get()) : std::string();
 }
 

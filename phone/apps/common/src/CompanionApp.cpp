@@ -10,7 +10,7 @@ namespace companion {
 namespace {
 
 std::string resource(const std::string& name) {
-  const common::Owned<char, std::free> folder(app_get_resource_path());
+  const common::OwnedPlainText folder(app_get_resource_path());
   return (folder ? folder.get() : "") + name;
 }
 

@@ -12,8 +12,6 @@ namespace {
 constexpr const char* kViewer = "com.orlant.zelqo";
 constexpr const char* kLaunchViewer = "http://tizen.org/appcontrol/operation/launch_viewer";
 
-using OwnedMalloc = common::Owned<char, std::free>;
-
 OwnedRequest newRequest(const char* appId, const char* operation) {
   app_control_h raw = nullptr;
   app_control_create(&raw);
@@ -46,14 +44,14 @@ void openShare(const char* viewType, const char* token, const std::string& reque
 std::string operationOf(app_control_h request) {
   char* raw = nullptr;
   app_control_get_operation(request, &raw);
-  const OwnedMalloc operation(raw);
+  const common::OwnedPlainText operation(raw);
   return raw ? raw : "";
 }
 
 std::string extraOf(app_control_h request, const char* key) {
   char* raw = nullptr;
   if (app_control_get_extra_data(request, key, &raw) != APP_CONTROL_ERROR_NONE) return {};
-  const OwnedMalloc value(raw);
+  const common::OwnedPlainText value(raw);
   return raw ? raw : "";
 }
 

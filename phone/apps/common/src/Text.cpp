@@ -46,7 +46,7 @@ std::string sizeText(unsigned long long bytes) {
 }
 
 std::string escape(const std::string& plain) {
-  const common::Owned<char, std::free> markup(
+  const common::OwnedPlainText markup(
       evas_textblock_text_utf8_to_markup(nullptr, singleLine(plain).c_str()));
   return markup ? markup.get() : "";
 }

@@ -34,6 +34,9 @@ struct Question {
 /// when it refuses or says nothing in time.
 common::OwnedVariant ask(GDBusConnection* bus, const Question& question, GError** error = nullptr);
 
+/// Whether this connection has the name from now on; false when it is another's.
+bool takeName(GDBusConnection* bus, const char* name);
+
 /// Runs `returned` on the main loop when a bus that was away is there again, each time, until this
 /// object goes.
 class BusReturn {
