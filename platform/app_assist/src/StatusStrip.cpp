@@ -28,8 +28,9 @@ connection_type_e currentNetwork() {
   connection_h connection = nullptr;
   connection_type_e type = CONNECTION_TYPE_DISCONNECTED;
   if (connection_create(&connection) != CONNECTION_ERROR_NONE) return type;
-  if (connection_get_type(connection, &type) != CONNECTION_ERROR_NONE)
+  if (connection_get_type(connection, &type) != CONNECTION_ERROR_NONE) {
     type = CONNECTION_TYPE_DISCONNECTED;
+  }
   connection_destroy(connection);
   return type;
 }

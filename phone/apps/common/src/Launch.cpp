@@ -86,7 +86,7 @@ PendingReply::PendingReply(app_control_h request) {
   if (app_control_clone(&copy, request) == APP_CONTROL_ERROR_NONE) _request.reset(copy);
 }
 
-PendingReply& PendingReply::operator=(PendingReply&& other) {
+PendingReply& PendingReply::operator=(PendingReply&& other) noexcept {
   send(APP_CONTROL_RESULT_CANCELED);
   _request = std::move(other._request);
   return *this;

@@ -27,7 +27,7 @@ class PendingReply {
   PendingReply() = default;
   explicit PendingReply(app_control_h request);
   PendingReply(PendingReply&& other) = default;
-  PendingReply& operator=(PendingReply&& other);
+  PendingReply& operator=(PendingReply&& other) noexcept;
   ~PendingReply();
 
   /// The first answer counts.
