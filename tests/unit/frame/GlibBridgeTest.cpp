@@ -14,49 +14,30 @@ gboolean count(gpointer data) {
   return G_SOURCE_REMOVE;
 }
 
-/// A bus of its own, and two connections to it.
-class PrivateBus {
+/// Two users of the phone's session bus that share nothing with the rest of this process.
+class Strangers {
  public:
-  PrivateBus() : _environment(g_get_environ()), _bus(g_test_dbus_new(G_TEST_DBUS_NONE)) {
-    g_test_dbus_up(_bus);
-    restoreEnvironment();
-    sender = connect();
-    receiver = connect();
-  }
-  ~PrivateBus() {
+  ~Strangers() {
     for (GDBusConnection* connection : {sender, receiver}) {
       g_dbus_connection_close_sync(connection, nullptr, nullptr);
       g_object_unref(connection);
     }
-    g_test_dbus_down(_bus);
-    g_object_unref(_bus);
-    restoreEnvironment();
-    g_strfreev(_environment);
   }
 
-  GDBusConnection* sender;
-  GDBusConnection* receiver;
+  GDBusConnection* const sender = connect();
+  GDBusConnection* const receiver = connect();
 
  private:
-  GDBusConnection* connect() {
-    return g_dbus_connection_new_for_address_sync(
-        g_test_dbus_get_bus_address(_bus),
+  static GDBusConnection* connect() {
+    char* address = g_dbus_address_get_for_bus_sync(G_BUS_TYPE_SESSION, nullptr, nullptr);
+    GDBusConnection* connection = g_dbus_connection_new_for_address_sync(
+        address,
         static_cast<GDBusConnectionFlags>(G_DBUS_CONNECTION_FLAGS_AUTHENTICATION_CLIENT |
                                           G_DBUS_CONNECTION_FLAGS_MESSAGE_BUS_CONNECTION),
         nullptr, nullptr, nullptr);
+    g_free(address);
+    return connection;
   }
-
-  /// A test bus takes the display and the buses away from the process.
-  void restoreEnvironment() {
-    for (char** entry = _environment; *entry; entry++) {
-      const std::string text(*entry);
-      const size_t end = text.find('=');
-      g_setenv(text.substr(0, end).c_str(), text.c_str() + end + 1, TRUE);
-    }
-  }
-
-  char** const _environment;
-  GTestDBus* const _bus;
 };
 
 }  // namespace
@@ -80,7 +61,7 @@ TEST(GlibBridge, WakesForATimeoutWhenTheToolkitHasNothingToDo) {
 }
 
 TEST(GlibBridge, DeliversSignalsOfABus) {
-  PrivateBus bus;
+  const Strangers bus;
   int signals = 0;
   g_dbus_connection_signal_subscribe(
       bus.receiver, nullptr, "test.Bridge", "Ping", "/bridge", nullptr, G_DBUS_SIGNAL_FLAGS_NONE,

@@ -1,5 +1,7 @@
 #include <malloc.h>
 
+#include <algorithm>
+
 #include "FramePages.h"
 
 using Naviframe = FrameTest;
@@ -55,7 +57,8 @@ TEST_F(Naviframe, LeavesNothingOfTheLayoutsOfAPage) {
     eina_freeq_clear(eina_freeq_main_get());
     return mallinfo2().uordblks;
   };
-  const auto showPages = [this] {
+  const auto growth = [&] {
+    const size_t before = used();
     for (size_t i = 0; i < kRounds; i++) {
       record.clear();
       naviframe->push(new CrowdedPage(record, "a"));
@@ -64,12 +67,14 @@ TEST_F(Naviframe, LeavesNothingOfTheLayoutsOfAPage) {
       EXPECT_TRUE(has("a gone"));
       runPastTransitions();
     }
+    const size_t after = used();
+    return after > before ? after - before : 0;
   };
-  showPages();
-  const size_t before = used();
-  showPages();
-  // Forgotten would be 32 bytes a layout; other things go when there is time.
-  EXPECT_TRUE(waitUntil([&] { return used() < before + kRounds * kLayouts * 16; }));
+  // Now and then the toolkit keeps or gives back megabytes of its own. What it forgot of a layout
+  // would be 32 bytes every time.
+  size_t least = growth();
+  for (int i = 0; i < 8 && least >= kRounds * kLayouts * 16; i++) least = std::min(least, growth());
+  EXPECT_LT(least, kRounds * kLayouts * 16);
 }
 
 TEST_F(Naviframe, DestroysAPageThatCannotBeCreated) {
