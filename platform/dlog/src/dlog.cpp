@@ -80,13 +80,17 @@ Log& theLog() {
   return log;
 }
 
+/// Whoever calls has the lock.
 void writeCount() {
   const Repetition::Line count = theLog().repetition.takeCount();
   if (count.priority != DLOG_UNKNOWN) writeLine(count);
 }
 
 int say(const Repetition::Line& line) {
-  static const int atEnd = atexit(writeCount);
+  static const int atEnd = atexit([] {
+    const std::lock_guard<std::mutex> lock(theLog().mutex);
+    writeCount();
+  });
   static_cast<void>(atEnd);
   const std::lock_guard<std::mutex> lock(theLog().mutex);
   const gint64 now = g_get_monotonic_time();
