@@ -9,10 +9,9 @@ using common::OwnedVariant;
 constexpr std::string_view kPrefix = "phoneapp.i";
 
 /// One question to the bus itself. Null when it refuses.
-OwnedVariant askBus(GDBusConnection* bus, const char* method, GVariant* arguments,
-                    std::chrono::milliseconds patience = base::kBusPatience) {
+OwnedVariant askBus(GDBusConnection* bus, const char* method, GVariant* arguments) {
   return base::ask(bus, {"org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
-                         method, arguments, nullptr, patience});
+                         method, arguments});
 }
 
 common::Owned<const char*, g_free> names(GVariant* answer) {
@@ -102,12 +101,7 @@ Caller findCaller(GDBusConnection* bus, const char* sender) {
 bool requestName(GDBusConnection* bus, const std::string& name, unsigned flags) {
   constexpr guint32 primaryOwner = 1, inQueue = 2, alreadyOwner = 4;
   if (name.empty()) return false;
-  // Asked before there is anything to be seen, and without it there never will be.
-  constexpr std::chrono::seconds patience(5);
-  OwnedVariant answer =
-      askBus(bus, "RequestName", g_variant_new("(su)", name.c_str(), flags), patience);
-  guint32 result = 0;
-  if (answer) g_variant_get(answer.get(), "(u)", &result);
+  const guint32 result = base::requestName(bus, name.c_str(), flags);
   return result == primaryOwner || result == inQueue || result == alreadyOwner;
 }
 

@@ -44,17 +44,21 @@ common::OwnedVariant ask(GDBusConnection* bus, const Question& question, GError*
   return answer;
 }
 
-bool takeName(GDBusConnection* bus, const char* name) {
-  constexpr guint32 doNotQueue = 4;
-  constexpr guint32 owner = 1;
+guint32 requestName(GDBusConnection* bus, const char* name, guint32 flags) {
   // Asked at the start of a program, which is nothing without its name.
   constexpr std::chrono::seconds patience(5);
   const common::OwnedVariant answer(
       ask(bus, {kBusName, "/org/freedesktop/DBus", kBusName, "RequestName",
-                g_variant_new("(su)", name, doNotQueue), "(u)", patience}));
+                g_variant_new("(su)", name, flags), "(u)", patience}));
   guint32 result = 0;
   if (answer) g_variant_get(answer.get(), "(u)", &result);
-  return result == owner;
+  return result;
+}
+
+bool takeName(GDBusConnection* bus, const char* name) {
+  constexpr guint32 doNotQueue = 4;
+  constexpr guint32 owner = 1;
+  return requestName(bus, name, doNotQueue) == owner;
 }
 
 BusReturn::BusReturn(BusKind kind, std::function<void()> returned)

@@ -34,6 +34,9 @@ struct Question {
 /// when it refuses or says nothing in time.
 common::OwnedVariant ask(GDBusConnection* bus, const Question& question, GError** error = nullptr);
 
+/// What the bus says to a request for a name, with flags as it has them: 1 for a name that is this
+/// connection's from now on; 0 when it says nothing.
+guint32 requestName(GDBusConnection* bus, const char* name, guint32 flags);
 /// Whether this connection has the name from now on; false when it is another's.
 bool takeName(GDBusConnection* bus, const char* name);
 
