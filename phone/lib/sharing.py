@@ -76,7 +76,7 @@ class Sharing:
         vconf = self._phone.tool("phone-vconf")
         if not vconf:
             return
-        language = self._phone.language
+        language = self._phone.settings["language"]
         words = ["set", "db/zelqo/msisdn", self._phone.settings["number"],
                  "db/menu_widget/language", language, "db/menu_widget/regionformat", language]
         if self.url:

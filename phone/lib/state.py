@@ -15,7 +15,7 @@ _FOLDERS = ("opt-usr/apps", "opt-usr/dbspace", "opt-usr/media/Downloads", "opt-u
 
 
 class State:
-    """Paths and settings. The settings are those of the last `phone up`."""
+    """Paths and settings. The settings are those of the last `phone up`, with the language of today."""
 
     def __init__(self, folder=None):
         folder = folder or os.environ.get("PHONE_STATE") or os.path.join(ROOT, "build", "phone")

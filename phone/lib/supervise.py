@@ -47,7 +47,6 @@ class Phone:
             self.environment.pop(key, None)
         self.programs = []
         self.display = None
-        self.language = self.settings["language"]
         self.sharing = Sharing(self)
         self.over = threading.Event()
 
@@ -185,14 +184,15 @@ class Phone:
 
     def set_language(self, language):
         """For everything that starts from now on."""
-        self.language = language
-        self.state.save({**self.state.settings(), "language": language})
+        self.settings["language"] = language
+        self.state.save(self.settings)
         buses.environment(self, environment.language_of(language))
         self.environment.update(environment.language_of(language))
 
     def status(self):
         from lib.image import applications
-        return {"display": self.display, "language": self.language, "service": self.sharing.url,
+        return {"display": self.display, "language": self.settings["language"],
+                "service": self.sharing.url,
                 "programs": [{"name": program.name, "state": program.state()}
                              for program in self.programs],
                 "applications": applications(self.state)}
